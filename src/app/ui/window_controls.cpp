@@ -1,0 +1,178 @@
+#include "app/ui/window_controls.h"
+
+#include <QGridLayout>
+#include <QHBoxLayout>
+#include <QMainWindow>
+#include <QMenuBar>
+#include <QStyle>
+#include <QVBoxLayout>
+
+namespace quorvel {
+
+QString Indexed(const char* name, int index) {
+    return QStringLiteral("%1(%2)").arg(QLatin1String(name)).arg(index);
+}
+
+QLabel* MakeLabel(const QString& caption, QWidget* parent, const QString& name) {
+    auto* label = new QLabel(caption, parent);
+    if (!name.isEmpty()) label->setObjectName(name);
+    return label;
+}
+
+QLineEdit* MakeEdit(const QString& name, QWidget* parent) {
+    auto* edit = new QLineEdit(parent);
+    edit->setObjectName(name);
+    return edit;
+}
+
+QPushButton* MakeButton(const QString& name, const QString& caption, QWidget* parent) {
+    auto* button = new QPushButton(caption, parent);
+    button->setObjectName(name);
+    return button;
+}
+
+QCheckBox* MakeCheck(const QString& name, const QString& caption, QWidget* parent) {
+    auto* check = new QCheckBox(caption, parent);
+    check->setObjectName(name);
+    return check;
+}
+
+QGroupBox* MakeFrame(const QString& name, const QString& caption, QWidget* parent) {
+    auto* frame = new QGroupBox(caption, parent);
+    frame->setObjectName(name);
+    return frame;
+}
+
+namespace {
+
+QWidget* BuildFileListColumn(WindowControls& c, QWidget* parent) {
+    auto* column = new QWidget(parent);
+    auto* layout = new QVBoxLayout(column);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->addWidget(MakeLabel(QStringLiteral("Files"), column));
+    c.Lst_Files = new QListWidget(column);
+    c.Lst_Files->setObjectName(QStringLiteral("Lst_Files"));
+    c.Lst_Files->setMinimumWidth(210);
+    layout->addWidget(c.Lst_Files, 1);
+
+    auto* buttons = new QHBoxLayout;
+    c.Cmd_DoFile[0] = MakeButton(Indexed("Cmd_DoFile", 0), QStringLiteral("New"), column);
+    c.Cmd_DoFile[1] = MakeButton(Indexed("Cmd_DoFile", 1), QString(), column);
+    c.Cmd_DoFile[1]->setIcon(column->style()->standardIcon(QStyle::SP_ArrowUp));
+    c.Cmd_DoFile[1]->setToolTip(QStringLiteral("Move the selected file up"));
+    c.Cmd_DoFile[2] = MakeButton(Indexed("Cmd_DoFile", 2), QString(), column);
+    c.Cmd_DoFile[2]->setIcon(column->style()->standardIcon(QStyle::SP_ArrowDown));
+    c.Cmd_DoFile[2]->setToolTip(QStringLiteral("Move the selected file down"));
+    c.Cmd_DoFile[3] = MakeButton(Indexed("Cmd_DoFile", 3), QStringLiteral("Delete"), column);
+    for (int i = 0; i < 4; ++i)
+        buttons->addWidget(c.Cmd_DoFile[i]);
+    layout->addLayout(buttons);
+    return column;
+}
+
+QLayout* BuildRunRow(WindowControls& c, QWidget* parent) {
+    auto* row = new QHBoxLayout;
+    c.Cmd_Process[0] = MakeButton(Indexed("Cmd_Process", 0), QStringLiteral("Process all"), parent);
+    c.Cmd_Process[1] = MakeButton(Indexed("Cmd_Process", 1), QStringLiteral("Process file"), parent);
+    c.Cmd_Cancel = MakeButton(QStringLiteral("Cmd_Cancel"), QStringLiteral("Cancel"), parent);
+    c.Cmd_Close = MakeButton(QStringLiteral("Cmd_Close"), QStringLiteral("Close"), parent);
+    for (auto* button : {c.Cmd_Process[0], c.Cmd_Process[1], c.Cmd_Cancel, c.Cmd_Close})
+        row->addWidget(button);
+    row->addSpacing(12);
+    c.Pic_ProgressFile->setObjectName(QStringLiteral("Pic_ProgressFile"));
+    c.Pic_ProgressFTP->setObjectName(QStringLiteral("Pic_ProgressFTP"));
+    for (auto* picture : {c.Pic_ProgressFile, c.Pic_ProgressFTP}) {
+        picture->setFixedHeight(20);
+        picture->setMinimumWidth(160);
+        row->addWidget(picture, 1);
+    }
+    return row;
+}
+
+QWidget* BuildTraceArea(WindowControls& c, QWidget* parent) {
+    auto* area = new QWidget(parent);
+    auto* layout = new QHBoxLayout(area);
+    layout->setContentsMargins(0, 0, 0, 0);
+    auto* switches = new QVBoxLayout;
+    c.Chk_Trace = MakeCheck(QStringLiteral("Chk_Trace"), QStringLiteral("Trace"), area);
+    c.chk_TraceServer =
+        MakeCheck(QStringLiteral("chk_TraceServer"), QStringLiteral("TraceServer"), area);
+    switches->addWidget(c.Chk_Trace);
+    switches->addWidget(c.chk_TraceServer);
+    const char* logs[] = {"Status", "Send", "Receive", "Decisions", "Receive detail"};
+    for (int i = 0; i < 5; ++i) {
+        c.chk_Log[i] = MakeCheck(Indexed("chk_Log", i), QLatin1String(logs[i]), area);
+        switches->addWidget(c.chk_Log[i]);
+    }
+    c.Cmd_Clear = MakeButton(QStringLiteral("Cmd_Clear"), QStringLiteral("Clear"), area);
+    switches->addWidget(c.Cmd_Clear);
+    switches->addStretch(1);
+    layout->addLayout(switches);
+    c.Lst_Trace = new QListWidget(area);
+    c.Lst_Trace->setObjectName(QStringLiteral("Lst_Trace"));
+    // The trace pane takes whatever room the window has left, but never less than this.
+    c.Lst_Trace->setMinimumSize(67, 67);
+    layout->addWidget(c.Lst_Trace, 1);
+    return area;
+}
+
+void BuildMenus(QMainWindow* window, WindowControls& c) {
+    auto* file = window->menuBar()->addMenu(QStringLiteral("&File"));
+    file->setObjectName(QStringLiteral("mnu_FileMenu"));
+    const char* captions[] = {"&New...", "&Open...", "&Save...", "-", "E&xit"};
+    for (int i = 0; i < 5; ++i) {
+        auto* action = new QAction(QLatin1String(captions[i]), window);
+        action->setSeparator(i == 3);
+        action->setObjectName(Indexed("mnu_File", i));
+        file->addAction(action);
+        c.mnu_File[i] = action;
+    }
+    for (int i = 0; i < 6; ++i) {
+        auto* action = new QAction(i == 0 ? QString() : QString::number(i), window);
+        action->setSeparator(i == 0);
+        action->setObjectName(Indexed("mnu_RecentFile", i));
+        action->setVisible(false);
+        file->addAction(action);
+        c.mnu_RecentFile[i] = action;
+    }
+    auto* help = window->menuBar()->addMenu(QStringLiteral("&Help"));
+    help->setObjectName(QStringLiteral("mnu_HelpMenu"));
+    c.mnu_Help[0] = help->addAction(QStringLiteral("&Contents"));
+    c.mnu_Help[0]->setObjectName(Indexed("mnu_Help", 0));
+}
+
+} // namespace
+
+void BuildWindowControls(QMainWindow* window, WindowControls& c) {
+    auto* central = new QWidget(window);
+    central->setObjectName(QStringLiteral("central"));
+    auto* root = new QVBoxLayout(central);
+    c.Pic_ProgressFile = MakeProgressPicture(central);
+    c.Pic_ProgressFTP = MakeProgressPicture(central);
+
+    auto* top = new QHBoxLayout;
+    c.SSTab1 = new QTabWidget(central);
+    c.SSTab1->setObjectName(QStringLiteral("SSTab1"));
+    c.SSTab1->addTab(BuildMainTab(c), QStringLiteral("Main"));
+    c.SSTab1->addTab(BuildFilesTab(c), QStringLiteral("Files"));
+    c.SSTab1->addTab(BuildFoldersTab(c), QStringLiteral("Folders"));
+    c.SSTab1->addTab(BuildNewSeasonTab(c), QStringLiteral("New Season"));
+    c.SSTab1->addTab(BuildOptionsTab(c), QStringLiteral("Options"));
+    top->addWidget(c.SSTab1, 1);
+    top->addWidget(BuildFileListColumn(c, central));
+    root->addLayout(top, 0);
+
+    root->addLayout(BuildRunRow(c, central));
+    c.Lbl_status = MakeLabel(QString(), central, QStringLiteral("Lbl_status"));
+    c.Lbl_status->setAutoFillBackground(true);
+    c.Lbl_status->setFrameShape(QFrame::Panel);
+    c.Lbl_status->setFrameShadow(QFrame::Sunken);
+    c.Lbl_status->setMinimumHeight(22);
+    root->addWidget(c.Lbl_status);
+    root->addWidget(BuildTraceArea(c, central), 1);
+
+    window->setCentralWidget(central);
+    BuildMenus(window, c);
+}
+
+} // namespace quorvel
