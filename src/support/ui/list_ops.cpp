@@ -1,0 +1,74 @@
+#include "support/ui/list_ops.h"
+
+#include <QComboBox>
+#include <QListWidget>
+
+namespace quorvel {
+
+namespace {
+
+std::int32_t DataOf(const QVariant& data) { return data.isValid() ? data.toInt() : 0; }
+
+int FindData(const QListWidget* list, std::int32_t value) {
+    for (int row = 0; row < list->count(); ++row) {
+        if (DataOf(list->item(row)->data(Qt::UserRole)) == value)
+            return row;
+    }
+    return -1;
+}
+
+} // namespace
+
+void ListAddItem(QListWidget* list, const QString& text, std::int32_t data) {
+    const int selected = list->currentRow();
+    const int row = selected >= 0 ? selected : list->count();
+    auto* item = new QListWidgetItem(text);
+    item->setData(Qt::UserRole, data);
+    list->insertItem(row, item);
+    list->setCurrentRow(row);
+}
+
+void ListAddItem(QComboBox* list, const QString& text, std::int32_t data) {
+    const int selected = list->currentIndex();
+    const int row = selected >= 0 ? selected : list->count();
+    list->insertItem(row, text, data);
+    list->setCurrentIndex(row);
+}
+
+void ListMoveItem(QListWidget* list, int direction) {
+    const int row = list->currentRow();
+    const int target = direction == 1 ? row - 1 : row + 1;
+    if (row < 0 || target < 0 || target >= list->count())
+        return;
+    QListWidgetItem* item = list->takeItem(row);
+    list->insertItem(target, item);
+    list->setCurrentRow(target);
+}
+
+void ListRemoveItem(QListWidget* list) {
+    const int row = list->currentRow();
+    if (row < 0)
+        return;
+    delete list->takeItem(row);
+    const int count = list->count();
+    list->setCurrentRow(count == 0 ? -1 : std::min(row, count - 1));
+}
+
+std::int32_t ListItemDataValue(const QListWidget* list) {
+    const QListWidgetItem* item = list->currentItem();
+    return item != nullptr ? DataOf(item->data(Qt::UserRole)) : 0;
+}
+
+std::int32_t ListItemDataValue(const QComboBox* list) {
+    return list->currentIndex() >= 0 ? DataOf(list->currentData(Qt::UserRole)) : 0;
+}
+
+void ListSelectItemData(QListWidget* list, std::int32_t value) {
+    list->setCurrentRow(FindData(list, value));
+}
+
+void ListSelectItemData(QComboBox* list, std::int32_t value) {
+    list->setCurrentIndex(list->findData(value, Qt::UserRole, Qt::MatchExactly));
+}
+
+} // namespace quorvel
