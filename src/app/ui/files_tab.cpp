@@ -30,8 +30,6 @@ QLayout* BuildNameRows(WindowControls& c, QWidget* page) {
     grid->addWidget(c.Txt_Name, 0, 1);
     c.Chk_Active = MakeCheck(QStringLiteral("Chk_Active"), QStringLiteral("Active"), page);
     c.Chk_Zip = MakeCheck(QStringLiteral("Chk_Zip"), QStringLiteral("Zip"), page);
-    for (auto* check : {c.Chk_Active, c.Chk_Zip})
-        check->setTristate(true); // the grey state marks "no record"
     auto* checks = new QHBoxLayout;
     checks->addWidget(c.Chk_Active);
     checks->addWidget(c.Chk_Zip);
@@ -57,7 +55,7 @@ QLayout* BuildNameRows(WindowControls& c, QWidget* page) {
 
 QGroupBox* BuildDownloadFrame(WindowControls& c, QWidget* page) {
     c.Frame_Download = MakeFrame(QStringLiteral("Frame_Download"), QStringLiteral("Download"), page);
-    c.Opt_Download = new OptionGroup(
+    c.Opt_Download = new OptionButtons(
         QStringLiteral("Opt_Download"),
         {QStringLiteral("Never"), QStringLiteral("Always"), QStringLiteral("Once"),
          QStringLiteral("Date")},
@@ -76,11 +74,11 @@ QGroupBox* BuildDownloadFrame(WindowControls& c, QWidget* page) {
     return c.Frame_Download;
 }
 
-QGroupBox* BuildRadioFrame(QGroupBox*& frame, OptionGroup*& group, const QString& frameName,
+QGroupBox* BuildRadioFrame(QGroupBox*& frame, OptionButtons*& group, const QString& frameName,
                            const QString& caption, const QString& groupName,
                            const QStringList& captions, QWidget* page) {
     frame = MakeFrame(frameName, caption, page);
-    group = new OptionGroup(groupName, captions, frame);
+    group = new OptionButtons(groupName, captions, frame);
     auto* layout = new QVBoxLayout(frame);
     for (int i = 0; i < group->Count(); ++i)
         layout->addWidget(group->Button(i));
@@ -121,7 +119,7 @@ QLayout* BuildLocationRow(WindowControls& c, QWidget* page) {
     row->setSpacing(0);
     c.Frame_AdminLocationID =
         MakeFrame(QStringLiteral("Frame_AdminLocationID"), QStringLiteral("Admin PC"), page);
-    c.Opt_AdminLocationID = new OptionGroup(QStringLiteral("Opt_AdminLocationID"),
+    c.Opt_AdminLocationID = new OptionButtons(QStringLiteral("Opt_AdminLocationID"),
                                             LocationCaptions(), c.Frame_AdminLocationID);
     auto* admin = LocationGrid(c.Frame_AdminLocationID);
     for (int i = 0; i < 5; ++i) {
@@ -134,7 +132,7 @@ QLayout* BuildLocationRow(WindowControls& c, QWidget* page) {
 
     c.Frame_UserLocationID =
         MakeFrame(QStringLiteral("Frame_UserLocationID"), QStringLiteral("User PC"), page);
-    c.Opt_UserLocationID = new OptionGroup(QStringLiteral("Opt_UserLocationID"),
+    c.Opt_UserLocationID = new OptionButtons(QStringLiteral("Opt_UserLocationID"),
                                            LocationCaptions(), c.Frame_UserLocationID);
     auto* user = LocationGrid(c.Frame_UserLocationID);
     // Room on the left of the buttons where the route lines come in.

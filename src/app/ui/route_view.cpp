@@ -4,29 +4,37 @@
 
 namespace quorvel {
 
+namespace {
+
+QColor ToColour(const RouteColour& colour) {
+    return QColor(colour.red, colour.green, colour.blue);
+}
+
+} // namespace
+
 RouteView::RouteView(const QString& name, QWidget* parent) : QWidget(parent) {
     setObjectName(name);
     setAttribute(Qt::WA_TransparentForMouseEvents);
 }
 
-void RouteView::SetSource(QWidget* origin, Source source) {
-    origin_ = origin;
+void RouteView::SetSource(QWidget* page, Source source) {
+    page_ = page;
     source_ = std::move(source);
 }
 
 void RouteView::paintEvent(QPaintEvent*) {
-    if (!origin_ || !source_) return;
+    if (!page_ || !source_) return;
+    const RouteDrawing drawing = source_();
     QPainter painter(this);
-    painter.setRenderHint(QPainter::Antialiasing);
-    painter.translate(-mapTo(origin_, QPoint(0, 0)));
-    for (const auto& stroke : source_()) {
-        QPen pen(stroke.colour, stroke.width, Qt::SolidLine, Qt::FlatCap);
-        painter.setPen(pen);
+    painter.translate(drawing.origin - mapTo(page_, QPoint(0, 0)));
+    for (const auto& stroke : drawing.strokes) {
+        const QColor colour = ToColour(stroke.colour);
+        painter.setPen(QPen(colour, stroke.lineWidth, Qt::SolidLine, Qt::FlatCap));
         painter.drawLine(stroke.from, stroke.to);
-        if (stroke.arrowHead.size() >= 3) {
-            painter.setPen(QPen(stroke.colour, 1));
-            painter.setBrush(stroke.colour);
-            painter.drawPolygon(stroke.arrowHead);
+        if (stroke.arrow) {
+            painter.setPen(QPen(colour, 1));
+            painter.setBrush(colour);
+            painter.drawPolygon(stroke.arrow->data(), static_cast<int>(stroke.arrow->size()));
             painter.setBrush(Qt::NoBrush);
         }
     }

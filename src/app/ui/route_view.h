@@ -1,11 +1,12 @@
 #pragma once
-// A picture that draws part of the route diagram. The lines are given in the
-// coordinates of a common origin widget, so that several pictures side by side
-// show one unbroken drawing.
+// A picture that shows part of the route diagram. The diagram is laid out on
+// one virtual picture between the two location frames; each RouteView paints
+// the piece of it that lies under itself, so pictures side by side (one of them
+// inside the "User PC" frame) show one unbroken drawing.
 
-#include <QColor>
+#include "app/route_geometry.h"
+
 #include <QPoint>
-#include <QPolygon>
 #include <QWidget>
 
 #include <functional>
@@ -13,29 +14,26 @@
 
 namespace quorvel {
 
-struct RouteStroke {
-    QPoint from;
-    QPoint to;
-    QColor colour;
-    int width = 1;
-    QPolygon arrowHead; // filled in the stroke's colour; empty for none
+struct RouteDrawing {
+    QPoint origin; // the virtual picture's top left, in the page's coordinates
+    std::vector<RouteStroke> strokes;
 };
 
 class RouteView : public QWidget {
     Q_OBJECT
 public:
-    using Source = std::function<std::vector<RouteStroke>()>;
+    using Source = std::function<RouteDrawing()>;
 
     RouteView(const QString& name, QWidget* parent);
 
-    // origin: the widget whose coordinates the strokes use.
-    void SetSource(QWidget* origin, Source source);
+    // page: the widget whose coordinates RouteDrawing::origin uses.
+    void SetSource(QWidget* page, Source source);
 
 protected:
     void paintEvent(QPaintEvent* event) override;
 
 private:
-    QWidget* origin_ = nullptr;
+    QWidget* page_ = nullptr;
     Source source_;
 };
 

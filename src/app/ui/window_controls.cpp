@@ -1,5 +1,7 @@
 #include "app/ui/window_controls.h"
 
+#include "support/ui/progress_bar.h"
+
 #include <QGridLayout>
 #include <QHBoxLayout>
 #include <QMainWindow>
@@ -147,8 +149,8 @@ void BuildWindowControls(QMainWindow* window, WindowControls& c) {
     auto* central = new QWidget(window);
     central->setObjectName(QStringLiteral("central"));
     auto* root = new QVBoxLayout(central);
-    c.Pic_ProgressFile = MakeProgressPicture(central);
-    c.Pic_ProgressFTP = MakeProgressPicture(central);
+    c.Pic_ProgressFile = new CProgress(central);
+    c.Pic_ProgressFTP = new CProgress(central);
 
     auto* top = new QHBoxLayout;
     c.SSTab1 = new QTabWidget(central);

@@ -2,7 +2,7 @@
 // Every control of the main window, by its described name. The window builds
 // them once (BuildWindowControls) and its procedures reach them through here.
 
-#include "app/ui/option_group.h"
+#include "app/ui/option_buttons.h"
 
 #include <QAction>
 #include <QCheckBox>
@@ -20,6 +20,7 @@ class QMainWindow;
 
 namespace quorvel {
 
+class CProgress;
 class RouteView;
 
 struct WindowControls {
@@ -33,7 +34,7 @@ struct WindowControls {
     QLabel* Lbl_UserName = nullptr;
     QCheckBox* Chk_RunAtStartUp = nullptr;
     QGroupBox* Frame1 = nullptr;
-    OptionGroup* Opt_Automatic = nullptr;
+    OptionButtons* Opt_Automatic = nullptr;
     QComboBox* Cmb_interval = nullptr;
     QLabel* Lbl_Due = nullptr;
     QLabel* Lbl_Now = nullptr;
@@ -50,17 +51,17 @@ struct WindowControls {
     QCheckBox* Chk_Zip = nullptr;
     QComboBox* Cmb_TypeID = nullptr;
     QGroupBox* Frame_Upload = nullptr;
-    OptionGroup* Opt_Upload = nullptr;
+    OptionButtons* Opt_Upload = nullptr;
     QGroupBox* Frame_Download = nullptr;
-    OptionGroup* Opt_Download = nullptr;
+    OptionButtons* Opt_Download = nullptr;
     QLineEdit* Txt_FileDate = nullptr;
     QLineEdit* Txt_FileDateLocal = nullptr;
     QGroupBox* Frame_MethodID = nullptr;
-    OptionGroup* Opt_MethodID = nullptr;
+    OptionButtons* Opt_MethodID = nullptr;
     QGroupBox* Frame_AdminLocationID = nullptr;
-    OptionGroup* Opt_AdminLocationID = nullptr;
+    OptionButtons* Opt_AdminLocationID = nullptr;
     QGroupBox* Frame_UserLocationID = nullptr;
-    OptionGroup* Opt_UserLocationID = nullptr;
+    OptionButtons* Opt_UserLocationID = nullptr;
     QLineEdit* Txt_Folder = nullptr;
     std::array<QLabel*, 4> lbl_UserLocationFolder{};
     std::array<RouteView*, 2> Pic_Route{};
@@ -69,11 +70,11 @@ struct WindowControls {
     std::array<QLabel*, 2> Lbl_LastDate{};
     std::array<QCheckBox*, 2> chk_ShowDate{};
     QGroupBox* Frame_Files = nullptr;
-    OptionGroup* Opt_GetFileList = nullptr;
+    OptionButtons* Opt_GetFileList = nullptr;
 
     // "Folders"
     QGroupBox* Frame9 = nullptr;
-    OptionGroup* Opt_GetLocalFolders = nullptr;
+    OptionButtons* Opt_GetLocalFolders = nullptr;
     QCheckBox* Chk_GotPHP = nullptr;
     std::array<QLineEdit*, 2> Txt_LocalFolder{};
     std::array<QPushButton*, 2> Cmd_LocateFolder{};
@@ -83,7 +84,7 @@ struct WindowControls {
 
     // "New Season"
     QGroupBox* Frame2 = nullptr;
-    OptionGroup* Opt_Whichdates = nullptr;
+    OptionButtons* Opt_Whichdates = nullptr;
     QLineEdit* Txt_AfterDate = nullptr;
     std::array<QLabel*, 2> lbl_Help{};
     QPushButton* Cmd_Admin = nullptr;
@@ -115,8 +116,8 @@ struct WindowControls {
     QCheckBox* chk_TraceServer = nullptr;
     std::array<QCheckBox*, 5> chk_Log{};
     QLabel* Lbl_status = nullptr;
-    QWidget* Pic_ProgressFile = nullptr;
-    QWidget* Pic_ProgressFTP = nullptr;
+    CProgress* Pic_ProgressFile = nullptr;
+    CProgress* Pic_ProgressFTP = nullptr;
 
     // Menus
     std::array<QAction*, 5> mnu_File{};
@@ -141,7 +142,5 @@ QPushButton* MakeButton(const QString& name, const QString& caption, QWidget* pa
 QCheckBox* MakeCheck(const QString& name, const QString& caption, QWidget* parent);
 QGroupBox* MakeFrame(const QString& name, const QString& caption, QWidget* parent);
 QString Indexed(const char* name, int index);
-// The picture on which a progress bar is drawn.
-QWidget* MakeProgressPicture(QWidget* parent);
 
 } // namespace quorvel

@@ -22,7 +22,7 @@ QLineEdit* AddEditRow(QGridLayout* grid, int row, const QString& caption, const 
 QGroupBox* BuildScheduleFrame(WindowControls& c, QWidget* page) {
     c.Frame1 = MakeFrame(QStringLiteral("Frame1"), QStringLiteral("Download"), page);
     auto* grid = new QGridLayout(c.Frame1);
-    c.Opt_Automatic = new OptionGroup(QStringLiteral("Opt_Automatic"),
+    c.Opt_Automatic = new OptionButtons(QStringLiteral("Opt_Automatic"),
                                       {QStringLiteral("Manual"), QStringLiteral("Automatic every")},
                                       c.Frame1);
     c.Cmb_interval = new QComboBox(c.Frame1);
@@ -88,7 +88,7 @@ QWidget* BuildFoldersTab(WindowControls& c) {
     c.Frame9 = MakeFrame(QStringLiteral("Frame9"), QStringLiteral("Folders from..."), page);
     auto* frameLayout = new QHBoxLayout(c.Frame9);
     c.Opt_GetLocalFolders =
-        new OptionGroup(QStringLiteral("Opt_GetLocalFolders"),
+        new OptionButtons(QStringLiteral("Opt_GetLocalFolders"),
                         {QStringLiteral("User"), QStringLiteral("Administrator")}, c.Frame9);
     frameLayout->addWidget(c.Opt_GetLocalFolders->Button(0));
     frameLayout->addWidget(c.Opt_GetLocalFolders->Button(1));
@@ -130,7 +130,7 @@ QWidget* BuildNewSeasonTab(WindowControls& c) {
     auto* layout = new QVBoxLayout(page);
     c.Frame2 = MakeFrame(QStringLiteral("Frame2"), QStringLiteral("Download which dates"), page);
     auto* frame = new QGridLayout(c.Frame2);
-    c.Opt_Whichdates = new OptionGroup(QStringLiteral("Opt_Whichdates"),
+    c.Opt_Whichdates = new OptionButtons(QStringLiteral("Opt_Whichdates"),
                                        {QStringLiteral("New data"), QStringLiteral("Data after")},
                                        c.Frame2);
     c.Txt_AfterDate = MakeEdit(QStringLiteral("Txt_AfterDate"), c.Frame2);

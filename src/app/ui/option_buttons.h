@@ -1,24 +1,23 @@
 #pragma once
-// An array of option buttons that behaves like one group: selecting a button by
-// index clears the others, and -1 clears them all (which an exclusive
-// QButtonGroup cannot do on its own).
+// An array of option buttons that acts as one group, exchanged as the index of
+// the selected button. All buttons of a group share one parent, whose other
+// children are no option buttons, so the buttons keep themselves exclusive.
 
+#include <QList>
 #include <QObject>
 #include <QString>
 #include <QStringList>
-#include <QVector>
 
-class QButtonGroup;
 class QRadioButton;
 class QWidget;
 
 namespace quorvel {
 
-class OptionGroup : public QObject {
+class OptionButtons : public QObject {
     Q_OBJECT
 public:
     // Creates one button per caption, named "<name>(<index>)", parented to parent.
-    OptionGroup(const QString& name, const QStringList& captions, QWidget* parent);
+    OptionButtons(const QString& name, const QStringList& captions, QWidget* parent);
 
     int Count() const { return static_cast<int>(buttons_.size()); }
     QRadioButton* Button(int index) const { return buttons_.at(index); }
@@ -35,8 +34,7 @@ Q_SIGNALS:
     void Clicked(int index);
 
 private:
-    QVector<QRadioButton*> buttons_;
-    QButtonGroup* group_;
+    QList<QRadioButton*> buttons_;
 };
 
 } // namespace quorvel

@@ -1,0 +1,107 @@
+#include "app/ui/frm_web_data_client.h"
+
+#include "app/ui/route_view.h"
+#include "app/ui/window_services.h"
+#include "support/program_home.h"
+#include "support/ui/list_ops.h"
+
+#include <QFileDialog>
+#include <QRadioButton>
+
+namespace quorvel {
+
+bool HasScheduleSwitch(const QStringList& arguments) {
+    for (const QString& argument : arguments)
+        if (argument.compare(QLatin1String("/S"), Qt::CaseInsensitive) == 0) return true;
+    return false;
+}
+
+FileDialogs FileDialogs::System() {
+    FileDialogs dialogs;
+    dialogs.openFiles = [](QWidget* owner, const QString& title, const QString& folder,
+                           const QString& filter) {
+        return QFileDialog::getOpenFileNames(owner, title, folder, filter);
+    };
+    dialogs.openFile = [](QWidget* owner, const QString& title, const QString& start,
+                          const QString& filter) {
+        return QFileDialog::getOpenFileName(owner, title, start, filter);
+    };
+    dialogs.saveFile = [](QWidget* owner, const QString& title, const QString& start,
+                          const QString& filter) {
+        QFileDialog dialog(owner, title, start, filter);
+        dialog.setAcceptMode(QFileDialog::AcceptSave);
+        dialog.setDefaultSuffix(QStringLiteral("txt"));
+        return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
+    };
+    return dialogs;
+}
+
+frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
+    : QMainWindow(parent), scheduledStart_(HasScheduleSwitch(arguments)),
+      settings_(ProgramHome::SettingsFile()), dialogs_(FileDialogs::System()) {
+    setObjectName(QStringLiteral("frm_WebDataClient"));
+    setWindowTitle(QStringLiteral("Quorvel"));
+    BuildWindowControls(this, c_);
+    for (auto* picture : c_.Pic_Route)
+        picture->SetSource(c_.FilesPage, [this] { return RouteLines(); });
+    c_.Frame_UserLocationID->installEventFilter(this);
+    services_ = std::make_unique<WindowServices>(*this);
+    ConnectHandlers();
+    InstallDropTargets();
+    resize(1000, 800);
+}
+
+frm_WebDataClient::~frm_WebDataClient() = default;
+
+void frm_WebDataClient::ConnectHandlers() {
+    ConnectRecordHandlers();
+    ConnectWindowHandlers();
+    ConnectMenus();
+}
+
+void frm_WebDataClient::SetLoadedFile(const QString& path) {
+    files_.LoadedFile = path;
+    c_.Lbl_LoadedFile->setText(path);
+}
+
+const FileRecord& frm_WebDataClient::RecordAt(int number) const {
+    // Numbers past the end stand for the empty record a new entry starts from.
+    static const FileRecord empty;
+    return number >= 1 && number <= files_.Count() ? files_.At(number - 1) : empty;
+}
+
+bool frm_WebDataClient::FileListFromUser() const {
+    return c_.Opt_GetFileList->Button(0)->isChecked();
+}
+
+int frm_WebDataClient::SelectedTypeID() const { return ListItemDataValue(c_.Cmb_TypeID); }
+
+LocationFolders frm_WebDataClient::Folders() const {
+    LocationFolders folders;
+    folders.application = c_.Txt_LocalFolder[0]->text();
+    folders.data = c_.Txt_LocalFolder[1]->text();
+    folders.user = c_.Txt_UserFolder->text();
+    folders.userCurrent = c_.Txt_UserCurrentFolder->text();
+    folders.web = c_.Txt_WebFolder->text();
+    folders.other = c_.Txt_Folder->text();
+    return folders;
+}
+
+LocationPath frm_WebDataClient::FullFilename(int which) const {
+    // The service side shows only the user's own folders when the file is uploaded.
+    const bool userFoldersOnly = c_.Opt_Upload->SelectedIndex() != kUploadNever;
+    return ProcessFilename(Folders(), c_.Txt_FileName->text(),
+                           c_.Opt_UserLocationID->SelectedIndex(),
+                           c_.Opt_AdminLocationID->SelectedIndex(), userFoldersOnly, which);
+}
+
+bool frm_WebDataClient::ShowError(const QString& where, const QString& description) {
+    flags_.IsLoading = false;
+    flags_.IsBusy = false;
+    flags_.InMessage = true;
+    CurrentPrompter().MyMsgBox(description + QStringLiteral("\r\nQuorvel:") + where,
+                               kButtonsOk | kIconExclamation);
+    return false;
+}
+
+} // namespace quorvel

@@ -1,0 +1,179 @@
+#pragma once
+// The main window: the program's settings and account fields, the editor of
+// the selected file record, the file list, the trace pane and the run buttons.
+// Loading it starts the client and closing it ends it.
+
+#include "app/app_error.h"
+#include "app/file_list.h"
+#include "app/locations.h"
+#include "app/recent_files.h"
+#include "app/ui/window_controls.h"
+#include "support/ini_store.h"
+#include "support/ports.h"
+
+#include <QMainWindow>
+#include <QStringList>
+
+#include <functional>
+#include <memory>
+
+class QMimeData;
+
+namespace quorvel {
+
+class WindowServices;
+struct AppSettings;
+
+// The window's flags. ListChanged lives with the file list.
+struct WindowFlags {
+    bool IsLoading = false;       // the program fills controls; field handlers stay quiet
+    bool InMessage = false;       // a box was shown; the next activation must not initialise
+    bool IsBusy = false;          // a run is under way
+    bool CancelRequested = false; // the run stops after the current file
+    bool RecordEdited = false;    // the record fields differ from their record
+};
+
+// The file dialogs, replaceable so that tests and scripted use can answer them.
+// An empty answer means the user cancelled.
+struct FileDialogs {
+    std::function<QStringList(QWidget*, const QString& title, const QString& folder,
+                              const QString& filter)>
+        openFiles;
+    std::function<QString(QWidget*, const QString& title, const QString& start,
+                          const QString& filter)>
+        openFile;
+    std::function<QString(QWidget*, const QString& title, const QString& start,
+                          const QString& filter)>
+        saveFile;
+    static FileDialogs System();
+};
+
+class frm_WebDataClient : public QMainWindow, public TraceView {
+    Q_OBJECT
+public:
+    // arguments: the command line without the program name ("/S" in any letter
+    // case starts minimised and leaves initialisation to the scheduler).
+    explicit frm_WebDataClient(QStringList arguments, QWidget* parent = nullptr);
+    ~frm_WebDataClient() override;
+
+    static constexpr const char* kApplicationTitle = "TALU Quorvel";
+
+    // Lifecycle.
+    void Form_Load();
+    void Form_Activate();
+    bool Initialise();
+    bool ConfigureClass();
+
+    // Window states, trace and status.
+    void EnableControls();
+    void AddTrace(const QString& text) override;
+    void ShowStatus(const QString& text) override;
+    bool ShowError(const QString& where, const QString& description);
+    bool ShowError(const AppError& error) { return ShowError(error.where, error.description); }
+    void SetChanged();
+
+    // The file list and the record fields.
+    bool OpenFileList(const QString& path);
+    bool LoadDataFile(const QString& path);
+    void LoadFilesListBox();
+    bool SaveFileList();
+    bool StoreCurrentRecord();
+    void ShowCurrentRecord();
+    void ClearRecordFields();
+    void AddNewFileRecord(const QString& path);
+    void SaveFileName(const QString& path);
+    void DoFile(int index);
+
+    // Drag and drop of files from the file manager.
+    bool AcceptsListDrop(const QMimeData* data) const;
+    bool AcceptsFileNameDrop(const QMimeData* data) const;
+    void DropOnList(const QMimeData* data);
+    void DropOnFileName(const QMimeData* data);
+
+    // Menus and the recent list.
+    void ConfigureRecentFiles();
+    void AddToRecentFiles(const QString& fileName);
+    void mnu_File_Click(int index);
+    void mnu_RecentFile_Click(int index);
+
+    // The folder fields as the location rules take them.
+    LocationFolders Folders() const;
+    // The full path of side 0 (this PC) or 1 (the service) of the current record.
+    LocationPath FullFilename(int which) const;
+
+    WindowControls& Controls() { return c_; }
+    const WindowControls& Controls() const { return c_; }
+    WindowFlags& Flags() { return flags_; }
+    const FileList& Files() const { return files_; }
+    const RecentFiles& Recent() const { return recent_; }
+    int CurrentRecordNumber() const { return currentRecord_; }
+    bool StartedMinimised() const { return scheduledStart_; }
+    void SetFileDialogs(FileDialogs dialogs) { dialogs_ = std::move(dialogs); }
+
+protected:
+    void closeEvent(QCloseEvent* event) override;
+    void changeEvent(QEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
+private:
+    // Set-up of the handlers, one group per file.
+    void ConnectHandlers();
+    void ConnectRecordHandlers();
+    void ConnectWindowHandlers();
+    void ConnectMenus();
+    void InstallDropTargets();
+
+    // Lifecycle details.
+    bool AccountSteps(bool& listFromService);
+    void ApplySettings(const AppSettings& values);
+    AppSettings CurrentSettings() const;
+    void Form_QueryUnload(bool& cancel);
+    void Form_Unload();
+    void NoteActivation(QEvent* event);
+
+    // States details.
+    void EnableRecordControls(bool editable, bool busy, int sel, int count, bool support);
+    void ShowFileStatus(int sel);
+    void ShowLocalStatus(const LocationPath& full);
+    void ShowRemoteStatus(const LocationPath& full);
+    void PlotRouteLines();
+    RouteDrawing RouteLines() const;
+
+    // Field handlers.
+    void Txt_Name_Change();
+    void Opt_Download_Click(int index);
+    void Opt_Upload_Click(int index);
+    void Opt_MethodID_Click(int index);
+    void Chk_Zip_Click();
+    void Cmb_TypeID_Click();
+    void Lst_Files_Click();
+    void Cmd_ClearFiles_Click();
+    void Cmd_LocateFile_Click();
+    void Cmd_LocateFolder_Click(int index);
+    void Cmd_EditFile_Click();
+    void Cmd_Cancel_Click();
+    void Chk_RunAtStartUp_Click();
+    void Chk_Trace_Click();
+
+    void SetLoadedFile(const QString& path);
+    const FileRecord& RecordAt(int number) const;
+    bool FileListFromUser() const;
+    int SelectedTypeID() const;
+
+    WindowControls c_;
+    WindowFlags flags_;
+    FileList files_;
+    RecentFiles recent_;
+    int currentRecord_ = 0; // record number shown in the fields, 0 for none
+    bool scheduledStart_ = false;
+    bool activated_ = false;
+    bool reactivate_ = false;
+    LocalSettings settings_;
+    FileDialogs dialogs_;
+    std::unique_ptr<WindowServices> services_;
+};
+
+// True when the arguments hold "/S" in any letter case.
+bool HasScheduleSwitch(const QStringList& arguments);
+
+} // namespace quorvel

@@ -1,0 +1,71 @@
+// The handlers of the window's buttons and switches outside the record fields.
+
+#include "app/ui/frm_web_data_client.h"
+#include "app/ui/window_services.h"
+#include "support/run_at_startup.h"
+#include "support/shell_open.h"
+
+#include <QRadioButton>
+
+namespace quorvel {
+
+void frm_WebDataClient::ConnectWindowHandlers() {
+    auto states = [this](auto&&...) {
+        if (!flags_.IsLoading) EnableControls();
+    };
+    for (auto* box : c_.chk_ShowDate)
+        connect(box, &QCheckBox::stateChanged, this, states);
+    connect(c_.Opt_GetFileList, &OptionButtons::Clicked, this, states);
+    connect(c_.Opt_GetLocalFolders, &OptionButtons::Clicked, this, states);
+    connect(c_.Chk_Trace, &QCheckBox::stateChanged, this, [this] { Chk_Trace_Click(); });
+    connect(c_.Chk_RunAtStartUp, &QCheckBox::stateChanged, this,
+            [this] { Chk_RunAtStartUp_Click(); });
+    connect(c_.Cmd_ClearFiles, &QPushButton::clicked, this, [this] { Cmd_ClearFiles_Click(); });
+    connect(c_.Cmd_Clear, &QPushButton::clicked, c_.Lst_Trace, &QListWidget::clear);
+    connect(c_.Cmd_Cancel, &QPushButton::clicked, this, [this] { Cmd_Cancel_Click(); });
+    connect(c_.Cmd_Close, &QPushButton::clicked, this, &QWidget::close);
+    connect(c_.Cmd_EditFile, &QPushButton::clicked, this, [this] { Cmd_EditFile_Click(); });
+    connect(c_.Cmd_LocateFile, &QPushButton::clicked, this, [this] { Cmd_LocateFile_Click(); });
+    for (int i = 0; i < 2; ++i)
+        connect(c_.Cmd_LocateFolder[i], &QPushButton::clicked, this,
+                [this, i] { Cmd_LocateFolder_Click(i); });
+    for (int i = 0; i < 5; ++i)
+        connect(c_.Cmd_DoFile[i], &QPushButton::clicked, this, [this, i] { DoFile(i); });
+}
+
+void frm_WebDataClient::Chk_Trace_Click() {
+    ShowStatus(QString());
+    EnableControls();
+}
+
+void frm_WebDataClient::Chk_RunAtStartUp_Click() {
+    SetRunAtStartup(c_.Chk_RunAtStartUp->isChecked() ? 1 : 0, false, QStringLiteral("/S"));
+}
+
+void frm_WebDataClient::Cmd_ClearFiles_Click() {
+    {
+        // Emptying the list box must not store the fields into a record.
+        const bool loading = flags_.IsLoading;
+        flags_.IsLoading = true;
+        c_.Lst_Files->clear();
+        flags_.IsLoading = loading;
+    }
+    ClearRecordFields();
+    EnableControls();
+}
+
+void frm_WebDataClient::Cmd_Cancel_Click() {
+    flags_.CancelRequested = true;
+    services_->Cancel();
+}
+
+void frm_WebDataClient::Cmd_EditFile_Click() {
+    const LocationPath local = FullFilename(kOnThisPc);
+    if (!local.ok()) {
+        ShowError(QStringLiteral("EditFile"), local.refusal);
+        return;
+    }
+    ShellOpenFile(local.path);
+}
+
+} // namespace quorvel

@@ -1,0 +1,212 @@
+// Start-up, activation and shut-down of the window, and the settings file.
+
+#include "app/app_settings.h"
+#include "app/ui/frm_web_data_client.h"
+#include "app/ui/window_services.h"
+#include "support/date_value.h"
+#include "support/program_home.h"
+#include "support/run_at_startup.h"
+#include "support/ui/list_ops.h"
+#include "support/ui/status_label.h"
+
+#include <QApplication>
+#include <QCloseEvent>
+#include <QFileDialog>
+#include <QMessageBox>
+#include <QRadioButton>
+
+namespace quorvel {
+
+namespace {
+
+void SetCheck(QCheckBox* box, int value) {
+    box->setCheckState(value != 0 ? Qt::Checked : Qt::Unchecked);
+}
+
+std::int16_t CheckOf(const QCheckBox* box) { return box->isChecked() ? 1 : 0; }
+
+std::int16_t IndexOf(const OptionButtons* group) {
+    return static_cast<std::int16_t>(group->SelectedIndex());
+}
+
+// Positions are kept in twips, 15 to a pixel at the usual 96 dots per inch.
+constexpr float kTwipsPerPixel = 15.0f;
+
+void SetBackground(QWidget* widget, const QColor& colour) {
+    widget->setAutoFillBackground(true);
+    QPalette palette = widget->palette();
+    palette.setColor(QPalette::Window, colour);
+    palette.setColor(QPalette::Base, colour);
+    widget->setPalette(palette);
+}
+
+} // namespace
+
+void frm_WebDataClient::Form_Load() {
+    flags_.IsLoading = true;
+    if (scheduledStart_) setWindowState(windowState() | Qt::WindowMinimized);
+    services_->Attach();
+    services_->FillIntervals(c_.Cmb_interval);
+    services_->FillDataTypes(c_.Cmb_TypeID);
+    SetBackground(c_.Lbl_UserName, kStatusHighlight);
+    SetBackground(c_.Lst_Files, kStatusHighlight);
+
+    AppSettings values = AppSettings::Defaults(ProgramHome::Folder(), QDate::currentDate().year());
+    const auto error = values.Load(settings_);
+    recent_ = values.recentFiles;
+    ApplySettings(values);
+    if (error) {
+        ShowError(error->where.isEmpty() ? QStringLiteral("Load") : error->where,
+                  error->description);
+        return;
+    }
+    c_.Chk_RunAtStartUp->setChecked(GetRunAtStartup(false, QStringLiteral("/S")) != 0);
+    ConfigureRecentFiles();
+    c_.Lbl_Now->setText(FormatDate(NowValue(), QString::fromLatin1(kPatternLong)));
+    recent_.SetEntry(1, values.loadedFile);
+    SetLoadedFile(values.loadedFile);
+    ConfigureRecentFiles();
+    ConfigureClass();
+    setWindowTitle(QString::fromLatin1(kApplicationTitle));
+    EnableControls();
+    flags_.IsLoading = false;
+}
+
+void frm_WebDataClient::ApplySettings(const AppSettings& values) {
+    c_.Txt_CFG_URL->setText(values.cfgUrl);
+    c_.Txt_UserID->setText(values.userId);
+    c_.Txt_Password->setText(values.password);
+    c_.Txt_LocalFolder[0]->setText(values.applicationFolder);
+    c_.Txt_LocalFolder[1]->setText(values.dataFolder);
+    SetCheck(c_.chk_ShowDate[0], values.showDate0);
+    c_.Opt_GetLocalFolders->SetIndex(values.getLocalFolders);
+    c_.Opt_GetFileList->SetIndex(values.getFileList);
+    c_.Opt_Automatic->SetIndex(values.automatic);
+    c_.Cmb_interval->setCurrentText(values.interval);
+    c_.Lbl_LastDownload->setText(values.lastDownload);
+    c_.Lbl_NextDownloadDue->setText(values.nextDownloadDue);
+    SetCheck(c_.Chk_DownloadOnly, values.downloadOnly);
+    c_.Opt_Whichdates->SetIndex(values.whichdates);
+    c_.Txt_AfterDate->setText(values.afterDate);
+}
+
+AppSettings frm_WebDataClient::CurrentSettings() const {
+    AppSettings values;
+    values.left = static_cast<float>(x()) * kTwipsPerPixel;
+    values.top = static_cast<float>(y()) * kTwipsPerPixel;
+    values.cfgUrl = c_.Txt_CFG_URL->text();
+    values.userId = c_.Txt_UserID->text();
+    values.password = c_.Txt_Password->text();
+    values.applicationFolder = c_.Txt_LocalFolder[0]->text();
+    values.dataFolder = c_.Txt_LocalFolder[1]->text();
+    values.automatic = IndexOf(c_.Opt_Automatic);
+    values.interval = c_.Cmb_interval->currentText();
+    values.lastDownload = c_.Lbl_LastDownload->text();
+    values.nextDownloadDue = c_.Lbl_NextDownloadDue->text();
+    values.whichdates = IndexOf(c_.Opt_Whichdates);
+    values.afterDate = c_.Txt_AfterDate->text();
+    values.showDate0 = CheckOf(c_.chk_ShowDate[0]);
+    values.showDate1 = CheckOf(c_.chk_ShowDate[1]);
+    values.getFileList = IndexOf(c_.Opt_GetFileList);
+    values.getLocalFolders = IndexOf(c_.Opt_GetLocalFolders);
+    values.downloadOnly = CheckOf(c_.Chk_DownloadOnly);
+    return values;
+}
+
+void frm_WebDataClient::Form_Activate() {
+    services_->Attach();
+    if (!flags_.InMessage && !scheduledStart_) Initialise();
+    flags_.InMessage = false;
+}
+
+bool frm_WebDataClient::AccountSteps(bool& listFromService) {
+    // The login steps go here: the configuration file, the user's details from
+    // the service and, when the administrator keeps the file list, the user's
+    // list from the service. Until they exist there is no account to sign in
+    // to, so the list named by the first recent entry is used.
+    listFromService = false;
+    return true;
+}
+
+bool frm_WebDataClient::Initialise() {
+    BusyGuard busy(CurrentBusyPointer());
+    bool listFromService = false;
+    if (!AccountSteps(listFromService)) return false;
+    if (!listFromService && !OpenFileList(recent_.Entry(1))) return false;
+    ShowStatus(QString());
+    return true;
+}
+
+bool frm_WebDataClient::ConfigureClass() {
+    WebSettings web;
+    web.ftpServer = c_.Txt_ftpServer->text();
+    web.ftpUserId = c_.txt_ftpUserID->text();
+    web.ftpPassword = c_.Txt_ftpPassword->text();
+    web.ftpTrace = c_.Chk_Trace->isChecked();
+    for (int i = 0; i < 5; ++i)
+        web.logs[i] = c_.chk_Log[i]->isChecked();
+    web.httpServer = c_.Txt_httpServer->text();
+    web.webFolder = c_.Txt_WebFolder->text();
+    web.fromDateChoice = c_.Opt_Whichdates->SelectedIndex();
+    web.afterDate = c_.Txt_AfterDate->text();
+    web.userId = c_.Txt_UserID->text();
+    web.password = c_.Txt_Password->text();
+    services_->Configure(web);
+    return true;
+}
+
+void frm_WebDataClient::Form_QueryUnload(bool& cancel) {
+    if (flags_.IsBusy) {
+        flags_.CancelRequested = true;
+        cancel = true;
+    }
+    services_->CloseFtp();
+    SaveFileList();
+}
+
+void frm_WebDataClient::Form_Unload() {
+    if (!CurrentSettings().Save(settings_))
+        ShowError(QStringLiteral("Unload"),
+                  QStringLiteral("The settings could not be written to ") + settings_.Path());
+    for (QWidget* window : QApplication::topLevelWidgets())
+        if (window != this && window->isVisible()) window->close();
+}
+
+void frm_WebDataClient::closeEvent(QCloseEvent* event) {
+    bool cancel = false;
+    Form_QueryUnload(cancel);
+    if (cancel) {
+        event->ignore();
+        return;
+    }
+    Form_Unload();
+    event->accept();
+}
+
+void frm_WebDataClient::changeEvent(QEvent* event) {
+    NoteActivation(event);
+    QMainWindow::changeEvent(event);
+}
+
+void frm_WebDataClient::NoteActivation(QEvent* event) {
+    if (event->type() != QEvent::ActivationChange) return;
+    if (!isActiveWindow()) {
+        // Only a return from another window of the program counts as an
+        // activation; file dialogs and the system's boxes do not.
+        QWidget* other = QApplication::activeWindow();
+        reactivate_ = other != nullptr && other != this && !qobject_cast<QFileDialog*>(other) &&
+                      !qobject_cast<QMessageBox*>(other);
+        return;
+    }
+    const bool first = !activated_;
+    activated_ = true;
+    // A return to the window never reloads a list whose changes are not saved.
+    const bool unsaved = files_.ListChanged || flags_.RecordEdited;
+    if (first || reactivate_) {
+        if (!first && unsaved) flags_.InMessage = true; // skips the initialisation
+        Form_Activate();
+    }
+    reactivate_ = false;
+}
+
+} // namespace quorvel

@@ -1,0 +1,88 @@
+// The File menu with its recent file lists, and the Help menu.
+
+#include "app/ui/frm_web_data_client.h"
+
+#include <QDir>
+
+namespace quorvel {
+
+namespace {
+
+const QString kListFilter = QStringLiteral("files.txt (file*.txt);;All files (*)");
+
+// A file name shown as a menu caption: "&" would mark a shortcut letter.
+QString MenuCaption(const QString& text) {
+    QString caption = text;
+    return caption.replace(QLatin1Char('&'), QLatin1String("&&"));
+}
+
+} // namespace
+
+void frm_WebDataClient::ConnectMenus() {
+    for (int i = 0; i < 5; ++i)
+        connect(c_.mnu_File[i], &QAction::triggered, this, [this, i] { mnu_File_Click(i); });
+    for (int i = 1; i <= RecentFiles::kEntries; ++i)
+        connect(c_.mnu_RecentFile[i], &QAction::triggered, this,
+                [this, i] { mnu_RecentFile_Click(i); });
+    // "&Contents" has no help file to open yet.
+    c_.mnu_Help[0]->setEnabled(false);
+}
+
+void frm_WebDataClient::ConfigureRecentFiles() {
+    const bool fromUser = FileListFromUser();
+    for (int i = 1; i <= RecentFiles::kEntries; ++i) {
+        c_.mnu_RecentFile[i]->setText(MenuCaption(recent_.Caption(i)));
+        c_.mnu_RecentFile[i]->setVisible(recent_.IsEntryVisible(i, fromUser));
+    }
+    c_.mnu_RecentFile[0]->setVisible(recent_.IsSeparatorVisible(fromUser));
+}
+
+void frm_WebDataClient::AddToRecentFiles(const QString& fileName) {
+    recent_.Add(fileName);
+    ConfigureRecentFiles();
+    SetLoadedFile(fileName);
+}
+
+void frm_WebDataClient::mnu_File_Click(int index) {
+    StoreCurrentRecord();
+    switch (index) {
+    case 0: {
+        files_.Clear();
+        currentRecord_ = 0;
+        const bool loading = flags_.IsLoading;
+        flags_.IsLoading = true;
+        c_.Lst_Files->clear();
+        flags_.IsLoading = loading;
+        SetLoadedFile(QString());
+        EnableControls();
+        break;
+    }
+    case 1: {
+        const QString chosen =
+            dialogs_.openFile(this, QStringLiteral("Open file list"), files_.LoadedFile, kListFilter);
+        if (!chosen.isEmpty()) OpenFileList(QDir::toNativeSeparators(chosen));
+        break;
+    }
+    case 2: {
+        const QString chosen =
+            dialogs_.saveFile(this, QStringLiteral("Save file list"), files_.LoadedFile, kListFilter);
+        if (chosen.isEmpty()) break;
+        AddToRecentFiles(QDir::toNativeSeparators(chosen));
+        // Saving under a chosen name writes the list even when it has not changed.
+        files_.ListChanged = true;
+        SaveFileList();
+        break;
+    }
+    case 4:
+        close();
+        break;
+    default:
+        break;
+    }
+}
+
+void frm_WebDataClient::mnu_RecentFile_Click(int index) {
+    if (!recent_.Entry(index).isEmpty()) OpenFileList(recent_.Entry(index));
+}
+
+} // namespace quorvel

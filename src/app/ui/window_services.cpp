@@ -1,0 +1,90 @@
+#include "app/ui/window_services.h"
+
+#include "app/ui/frm_web_data_client.h"
+#include "support/ui/progress_bar.h"
+#include "transfer/ftp.h"
+#include "webdata/combo_sink.h"
+#include "webdata/talu_web_data.h"
+#include "webdata/tcp_socket_control.h"
+
+#include <QComboBox>
+
+namespace quorvel {
+
+namespace {
+
+// Fills a combo box of the window from the web-data object's lists.
+class ComboBoxSink : public ComboSink {
+public:
+    explicit ComboBoxSink(QComboBox* combo) : combo_(combo) {}
+    void Clear() override { combo_->clear(); }
+    void AddItem(const QString& text, int itemData) override { combo_->addItem(text, itemData); }
+    void SetCurrentIndex(int index) override { combo_->setCurrentIndex(index); }
+
+private:
+    QComboBox* combo_;
+};
+
+} // namespace
+
+WindowServices::WindowServices(frm_WebDataClient& window)
+    : window_(window), socket_(std::make_unique<TcpSocketControl>(1)),
+      webData_(std::make_unique<CTALUWebData>()) {
+    webData_->MyWinsock(socket_.get());
+    QObject::connect(webData_.get(), &CTALUWebData::Finished, &window,
+                     [this](const QString& text) { window_.ShowStatus(text); });
+    QObject::connect(webData_.get(), &CTALUWebData::ShowStatus, &window,
+                     [this](const QString& text) { window_.ShowStatus(text); });
+    QObject::connect(webData_.get(), &CTALUWebData::ShowLog, &window,
+                     [this](const QString& text) { window_.AddTrace(text); });
+    QObject::connect(webData_.get(), &CTALUWebData::ShowReceived, &window,
+                     [this](const QString& text) { window_.AddTrace(text); });
+    // ProgressShow is not connected: the object draws its own progress.
+}
+
+WindowServices::~WindowServices() {
+    // The FTP module must not keep pointers to displays that are going away.
+    SetFTPDisplay(nullptr, nullptr);
+}
+
+void WindowServices::Attach() { SetFTPDisplay(&window_, window_.Controls().Pic_ProgressFTP); }
+
+void WindowServices::FillIntervals(QComboBox* combo) const {
+    ComboBoxSink sink(combo);
+    webData_->LoadComboWithIntervals(sink);
+}
+
+void WindowServices::FillDataTypes(QComboBox* combo) const {
+    ComboBoxSink sink(combo);
+    webData_->LoadComboWithDataTypes(sink);
+}
+
+void WindowServices::Configure(const WebSettings& s) {
+    SetFTPDetails(s.ftpServer, s.ftpUserId, s.ftpPassword, s.ftpTrace);
+    webData_->SetAgent(QStringLiteral("TALUQuorvel"));
+    for (int i = 0; i < static_cast<int>(s.logs.size()); ++i)
+        webData_->EnableLog(i, s.logs[i] ? 1 : 0);
+    webData_->SetRemoteHost(s.httpServer);
+    webData_->SetWebFolder(s.webFolder);
+    webData_->SetFromDate(s.fromDateChoice, s.afterDate);
+    webData_->SetUserID(s.userId);
+    webData_->SetPassword(s.password);
+    webData_->SetPictureBox(window_.Controls().Pic_ProgressFTP);
+}
+
+void WindowServices::Cancel() { webData_->SetUserCancel(1); }
+
+void WindowServices::CloseFtp() { ftpClose(); }
+
+QString WindowServices::LastDateInFile(const QString& file, int locationId, int which,
+                                       int dataType, bool display) {
+    return webData_->LastDateInFile(file, locationId, which, dataType, display ? 1 : 0);
+}
+
+std::optional<std::int64_t> WindowServices::RemoteFileSize(const QString& remote) {
+    std::int64_t size = 0;
+    if (!ftpRemoteFileSize(remote, size)) return std::nullopt;
+    return size;
+}
+
+} // namespace quorvel
