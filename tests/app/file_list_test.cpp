@@ -4,6 +4,7 @@
 #include "app/file_list_format.h"
 #include "common/recorders.h"
 #include "common/temp_home.h"
+#include "sample_list.h"
 
 #include <QDir>
 #include <QFile>
@@ -241,6 +242,18 @@ TEST(LocalDates, NoLocalListChangesNothing) {
     list.Append(FullRecord(4, "a"));
     EXPECT_FALSE(list.LoadLocalDates(home.File("empty")).has_value());
     EXPECT_EQ(list.At(0).FileDateLocal, "1 Mar 2024");
+}
+
+TEST(FileListSave, ALongListRoundTrips) {
+    TempHome home;
+    const QString path = home.File("big.txt");
+    ASSERT_FALSE(testing::WriteSampleList(path, 5000).has_value());
+    FileList list;
+    const ListLoadResult result = list.LoadDataFile(path);
+    EXPECT_TRUE(result.ok);
+    EXPECT_TRUE(result.errors.empty());
+    ASSERT_EQ(list.Count(), 5000);
+    EXPECT_EQ(list.At(4321), testing::SampleRecord(4321));
 }
 
 } // namespace
