@@ -1,9 +1,11 @@
 // Quorvel: keeps data-logger files in step with the user's account on a web service.
 
+#include "app/ui/frm_web_data_client.h"
+#include "app/ui/window_ports.h"
 #include "support/cipher.h"
 #include "support/program_home.h"
 
-#include <QCoreApplication>
+#include <QApplication>
 #include <QStringList>
 #include <QTextStream>
 
@@ -22,14 +24,8 @@ void PrintUsage(QTextStream& out) {
         << "  --encipher TEXT  print TEXT enciphered for line 3 of a configuration file\n";
 }
 
-} // namespace
-
-int main(int argc, char* argv[]) {
-    QCoreApplication app(argc, argv);
-    QStringList args = app.arguments();
-    args.removeFirst();
-    quorvel::ProgramHome::Configure(args);
-
+// Answers the switches that print something and end; -1 when the window is to start.
+int AnswerSwitches(const QStringList& args) {
     QTextStream out(stdout);
     if (args.contains("--help") || args.contains("-h")) {
         PrintUsage(out);
@@ -47,7 +43,26 @@ int main(int argc, char* argv[]) {
         out << quorvel::EncryptHex(args.at(at + 1), kLoginKey) << "\n";
         return 0;
     }
-    PrintUsage(out);
-    out << "\nSettings and logs: " << quorvel::ProgramHome::Folder() << "\n";
-    return 0;
+    return -1;
+}
+
+} // namespace
+
+int main(int argc, char* argv[]) {
+    // The printing switches need no display, so they are answered before one is opened.
+    QStringList given;
+    for (int i = 1; i < argc; ++i)
+        given << QString::fromLocal8Bit(argv[i]);
+    if (const int code = AnswerSwitches(given); code >= 0) return code;
+
+    QApplication app(argc, argv);
+    QStringList args = app.arguments();
+    args.removeFirst();
+    quorvel::ProgramHome::Configure(args);
+
+    quorvel::frm_WebDataClient window(args);
+    quorvel::WindowPorts ports(&window);
+    window.Form_Load();
+    window.show();
+    return app.exec();
 }
