@@ -1,6 +1,6 @@
 # Warnings and sanitizers applied to every target of the project.
 add_compile_options(-Wall -Wextra)
-add_compile_definitions(QT_NO_KEYWORDS QT_USE_QSTRINGBUILDER)
+add_compile_definitions(QT_NO_KEYWORDS)
 
 if(QUORVEL_SANITIZE)
     add_compile_options(-fsanitize=address,undefined -fno-omit-frame-pointer

@@ -12,7 +12,13 @@ namespace quorvel {
 
 // Standard message-box answers and button sets (only the lowest three bits of
 // a button code choose the set; icon flags such as 32 or 48 are ignored).
-enum MsgAnswer : int { kAnswerOk = 1, kAnswerCancel = 2, kAnswerRetry = 4, kAnswerYes = 6, kAnswerNo = 7 };
+enum MsgAnswer : int {
+    kAnswerOk = 1,
+    kAnswerCancel = 2,
+    kAnswerRetry = 4,
+    kAnswerYes = 6,
+    kAnswerNo = 7
+};
 enum MsgButtons : int {
     kButtonsOk = 0,
     kButtonsOkCancel = 1,
@@ -73,10 +79,10 @@ private:
 
 // Every wait of the program takes its length from here, so tests can shorten them.
 struct WaitLengths {
-    std::chrono::milliseconds replyGap{10000};   // silence that ends a wait for a reply
-    std::chrono::milliseconds messageBox{5000};  // self-closing message box
-    std::chrono::milliseconds firstTick{60000};  // scheduler's first tick after start
-    std::chrono::milliseconds tick{10000};       // scheduler's later ticks
+    std::chrono::milliseconds replyGap{10000};  // silence that ends a wait for a reply
+    std::chrono::milliseconds messageBox{5000}; // self-closing message box
+    std::chrono::milliseconds firstTick{60000}; // scheduler's first tick after start
+    std::chrono::milliseconds tick{10000};      // scheduler's later ticks
 };
 
 class Clock {

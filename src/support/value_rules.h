@@ -23,9 +23,12 @@ double RoundHalfEven(double value);
 
 // ValDouble rounded (halves to even) and clamped to 32 bits; 0 for null or empty.
 std::int32_t ValLong(QStringView text);
+std::int32_t ValLong(const QString& text);
+std::int32_t ValLong(const char* text);
 std::int32_t ValLong(const QVariant& value);
 bool IsNonZero(const QVariant& value);
 bool IsNonZero(QStringView text);
+bool IsNonZero(const QString& text);
 
 // Strict conversion to 16 bits: the whole text (blanks around it allowed) must
 // be a number; halves round to even. A non-number or an overflow gives nullopt.

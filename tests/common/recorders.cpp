@@ -3,8 +3,7 @@
 namespace quorvel::testing {
 
 int RecordingPrompter::Answer(int buttons) {
-    if (answers_.empty())
-        return DefaultAnswer(buttons);
+    if (answers_.empty()) return DefaultAnswer(buttons);
     const int answer = answers_.front();
     answers_.pop_front();
     return answer;

@@ -8,18 +8,23 @@
 
 namespace quorvel::testing {
 
-TempHome::TempHome() { ProgramHome::SetFolder(dir_.path()); }
+TempHome::TempHome() {
+    ProgramHome::SetFolder(dir_.path());
+}
 
-TempHome::~TempHome() { ProgramHome::SetFolder({}); }
+TempHome::~TempHome() {
+    ProgramHome::SetFolder({});
+}
 
-QString TempHome::File(const QString& name) const { return dir_.filePath(name); }
+QString TempHome::File(const QString& name) const {
+    return dir_.filePath(name);
+}
 
 QString TempHome::Write(const QString& name, const QByteArray& bytes) const {
     const QString path = File(name);
     QDir().mkpath(QFileInfo(path).path());
     QFile file(path);
-    if (file.open(QIODevice::WriteOnly | QIODevice::Truncate))
-        file.write(bytes);
+    if (file.open(QIODevice::WriteOnly | QIODevice::Truncate)) file.write(bytes);
     return path;
 }
 
