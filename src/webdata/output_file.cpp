@@ -1,0 +1,68 @@
+#include "webdata/output_file.h"
+
+#include "webdata/last_line.h"
+#include "webdata/webdata_error.h"
+
+#include <QFileInfo>
+
+namespace quorvel {
+
+namespace {
+constexpr qsizetype kGather = 256 * 1024;
+}
+
+OutputFile::~OutputFile() {
+    try {
+        Close();
+    } catch (const WebDataError&) {
+        // Nothing left to tell anyone at this point.
+    }
+}
+
+void OutputFile::Open(const QString& path, bool& created) {
+    Close();
+    created = !QFileInfo::exists(path);
+    bool needsLineEnd = false;
+    if (!created) {
+        const std::optional<LastLine> last = ReadLastLine(path);
+        needsLineEnd = last && !last->endsWithLineEnd;
+    }
+    file_.setFileName(path);
+    const QIODevice::OpenMode mode = created ? QIODevice::WriteOnly : QIODevice::Append;
+    if (!file_.open(mode))
+        throw WebDataError(file_.errorString() + QStringLiteral(": ") + path);
+    pending_.reserve(kGather + 4096);
+    if (needsLineEnd)
+        pending_.append("\r\n");
+}
+
+void OutputFile::WriteLine(QByteArrayView line) {
+    pending_.append(line);
+    pending_.append("\r\n", 2);
+    if (pending_.size() >= kGather)
+        Flush();
+}
+
+void OutputFile::Flush() {
+    if (pending_.isEmpty())
+        return;
+    const qint64 written = file_.write(pending_);
+    const bool ok = written == pending_.size() && file_.flush();
+    pending_.clear();
+    if (!ok)
+        throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
+}
+
+void OutputFile::Close() {
+    if (!file_.isOpen())
+        return;
+    try {
+        Flush();
+    } catch (const WebDataError&) {
+        file_.close();
+        throw;
+    }
+    file_.close();
+}
+
+} // namespace quorvel
