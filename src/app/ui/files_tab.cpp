@@ -67,6 +67,8 @@ QGroupBox* BuildDownloadFrame(WindowControls& c, QWidget* page) {
     c.Txt_FileDateLocal = MakeEdit(QStringLiteral("Txt_FileDateLocal"), c.Frame_Download);
     c.Txt_FileDate->setToolTip(QStringLiteral("Date of the file at the web site"));
     c.Txt_FileDateLocal->setToolTip(QStringLiteral("Date of the copy on this PC"));
+    for (auto* date : {c.Txt_FileDate, c.Txt_FileDateLocal})
+        date->setMinimumWidth(150);
     grid->addWidget(MakeLabel(QStringLiteral("List:"), c.Frame_Download), 2, 0);
     grid->addWidget(c.Txt_FileDate, 2, 1);
     grid->addWidget(MakeLabel(QStringLiteral("Local:"), c.Frame_Download), 3, 0);

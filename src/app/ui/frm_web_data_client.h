@@ -7,6 +7,7 @@
 #include "app/file_list.h"
 #include "app/locations.h"
 #include "app/recent_files.h"
+#include "app/ui/route_view.h"
 #include "app/ui/window_controls.h"
 #include "support/ini_store.h"
 #include "support/ports.h"
@@ -113,6 +114,7 @@ public:
 protected:
     void closeEvent(QCloseEvent* event) override;
     void changeEvent(QEvent* event) override;
+    void showEvent(QShowEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:

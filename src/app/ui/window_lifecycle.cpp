@@ -14,6 +14,7 @@
 #include <QFileDialog>
 #include <QMessageBox>
 #include <QRadioButton>
+#include <QTimer>
 
 namespace quorvel {
 
@@ -181,6 +182,18 @@ void frm_WebDataClient::closeEvent(QCloseEvent* event) {
     }
     Form_Unload();
     event->accept();
+}
+
+void frm_WebDataClient::showEvent(QShowEvent* event) {
+    QMainWindow::showEvent(event);
+    // The first showing counts as the first activation, also where no window
+    // manager ever activates the window.
+    if (!activated_)
+        QTimer::singleShot(0, this, [this] {
+            if (activated_) return;
+            activated_ = true;
+            Form_Activate();
+        });
 }
 
 void frm_WebDataClient::changeEvent(QEvent* event) {
