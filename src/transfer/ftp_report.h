@@ -6,7 +6,6 @@
 
 #include "support/ports.h"
 
-#include <QElapsedTimer>
 #include <QString>
 
 #include <cstdint>
@@ -43,7 +42,7 @@ public:
 
     void Trace(const QString& text);
     void Status(const QString& text);
-    // Lets pending events run; cheap to call often.
+    // Lets pending events run.
     void Pump();
 
     TransferCounters& Counters() { return counters_; }
@@ -59,7 +58,6 @@ private:
     bool tracing_ = false;
     TransferCounters counters_;
     std::int64_t shownBytes_ = -1;
-    QElapsedTimer sincePump_;
 };
 
 // "50%" for bytes within a known total, empty otherwise.
