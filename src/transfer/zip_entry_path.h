@@ -1,0 +1,13 @@
+#pragma once
+// Where an archive entry may be written.
+
+#include <QString>
+
+namespace quorvel {
+
+// The full path of an entry inside the folder, or an empty text when the entry
+// name is absolute, names a drive, or climbs out with "..". Either "/" or "\"
+// separates folders in an entry name.
+QString SafeEntryPath(const QString& folder, const QString& entryName);
+
+} // namespace quorvel

@@ -1,0 +1,67 @@
+// Connection events turned into status texts, traces and progress.
+#include "common/recorders.h"
+#include "transfer/ftp_status_events.h"
+
+#include <gtest/gtest.h>
+
+namespace quorvel {
+namespace {
+
+class FtpEventsTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        report.SetDisplay(&view, &progress);
+        report.SetTracing(true);
+    }
+    HandleIds ids;
+    FtpReport report{ids};
+    testing::RecordingPorts ports;
+    testing::RecordingTraceView view;
+    testing::RecordingProgressView progress;
+};
+
+TEST_F(FtpEventsTest, DownloadBeyondFourGigabytesCountsIn64Bits) {
+    const std::int64_t total = (std::int64_t{5} << 30) + 7;
+    report.Counters().currentFile = QStringLiteral("big.dat");
+    report.ProgressStart(TransferState::Download, total, QStringLiteral("big.dat=>/tmp/big.dat"));
+    HandleFtpStatus(report, 41, QString(), std::int64_t{3} << 30);
+    HandleFtpStatus(report, 41, QString(), total - (std::int64_t{3} << 30));
+    EXPECT_EQ(progress.total, total);
+    ASSERT_EQ(progress.steps.size(), 2u);
+    EXPECT_EQ(progress.steps[1].value, total);
+    EXPECT_EQ(progress.steps[1].text, QStringLiteral("big.dat"));
+    EXPECT_TRUE(
+        view.traces.last().contains(QStringLiteral(":Downloading  5368709127 of 5368709127 ")));
+    EXPECT_EQ(
+        view.traces.filter(QStringLiteral("FTPProgress: 5368709127/5368709127 = 100%")).size(), 1);
+}
+
+TEST_F(FtpEventsTest, ProgressBeyondTheTotalHasNoPercentage) {
+    EXPECT_EQ(PercentText(26, 25), QString());
+    EXPECT_EQ(PercentText(5, 0), QString());
+    EXPECT_EQ(PercentText(25, 100), QStringLiteral("25%"));
+}
+
+TEST_F(FtpEventsTest, HandleClosingEndsTheTransferOnce) {
+    report.ProgressStart(TransferState::Upload, 10, QStringLiteral("a=>b"));
+    HandleFtpStatus(report, 30, QString(), 10);
+    EXPECT_TRUE(view.traces.last().contains(QStringLiteral(":Uploading 10/10 ")));
+    HandleFtpStatus(report, 70, QString(), 0);
+    EXPECT_EQ(view.statuses.last(), QStringLiteral("Upload complete"));
+    EXPECT_EQ(report.Counters().state, TransferState::None);
+    HandleFtpStatus(report, 70, QString(), 0);
+    EXPECT_TRUE(view.traces.last().contains(QStringLiteral(":Handle closed - unknown state ")));
+}
+
+TEST_F(FtpEventsTest, LostConnectionAsksForAClose) {
+    EXPECT_EQ(HandleFtpStatus(report, 51, QString(), 0), FtpFollowUp::CloseConnection);
+    EXPECT_EQ(view.statuses.last(), QStringLiteral("Connection closed (call ftpClose)"));
+    EXPECT_EQ(HandleFtpStatus(report, 200, QString(), 2), FtpFollowUp::CloseConnection);
+    EXPECT_EQ(HandleFtpStatus(report, 200, QString(), 16), FtpFollowUp::None);
+    EXPECT_EQ(HandleFtpStatus(report, 77, QString(), 0), FtpFollowUp::None);
+    EXPECT_TRUE(view.traces.last().contains(
+        QStringLiteral(":CallStatusFTP, but unknown al_InternetStatus= 77 ")));
+}
+
+} // namespace
+} // namespace quorvel
