@@ -54,12 +54,12 @@ QLayout* BuildNameRows(WindowControls& c, QWidget* page) {
 }
 
 QGroupBox* BuildDownloadFrame(WindowControls& c, QWidget* page) {
-    c.Frame_Download = MakeFrame(QStringLiteral("Frame_Download"), QStringLiteral("Download"), page);
-    c.Opt_Download = new OptionButtons(
-        QStringLiteral("Opt_Download"),
-        {QStringLiteral("Never"), QStringLiteral("Always"), QStringLiteral("Once"),
-         QStringLiteral("Date")},
-        c.Frame_Download);
+    c.Frame_Download =
+        MakeFrame(QStringLiteral("Frame_Download"), QStringLiteral("Download"), page);
+    c.Opt_Download = new OptionButtons(QStringLiteral("Opt_Download"),
+                                       {QStringLiteral("Never"), QStringLiteral("Always"),
+                                        QStringLiteral("Once"), QStringLiteral("Date")},
+                                       c.Frame_Download);
     auto* grid = new QGridLayout(c.Frame_Download);
     for (int i = 0; i < 4; ++i)
         grid->addWidget(c.Opt_Download->Button(i), i % 2, i / 2);
@@ -95,15 +95,14 @@ QLayout* BuildRuleRow(WindowControls& c, QWidget* page) {
         c.Frame_Upload, c.Opt_Upload, QStringLiteral("Frame_Upload"), QStringLiteral("Upload"),
         QStringLiteral("Opt_Upload"),
         {QStringLiteral("Never"), QStringLiteral("Always"), QStringLiteral("Once")}, page));
-    row->addWidget(BuildRadioFrame(c.Frame_MethodID, c.Opt_MethodID,
-                                   QStringLiteral("Frame_MethodID"), QStringLiteral("Which data"),
-                                   QStringLiteral("Opt_MethodID"),
-                                   {QStringLiteral("Complete file"), QStringLiteral("Only new data")},
-                                   page));
-    row->addWidget(BuildRadioFrame(c.Frame_Files, c.Opt_GetFileList, QStringLiteral("Frame_Files"),
-                                   QStringLiteral("File list from..."),
-                                   QStringLiteral("Opt_GetFileList"),
-                                   {QStringLiteral("User"), QStringLiteral("Administrator")}, page));
+    row->addWidget(
+        BuildRadioFrame(c.Frame_MethodID, c.Opt_MethodID, QStringLiteral("Frame_MethodID"),
+                        QStringLiteral("Which data"), QStringLiteral("Opt_MethodID"),
+                        {QStringLiteral("Complete file"), QStringLiteral("Only new data")}, page));
+    row->addWidget(
+        BuildRadioFrame(c.Frame_Files, c.Opt_GetFileList, QStringLiteral("Frame_Files"),
+                        QStringLiteral("File list from..."), QStringLiteral("Opt_GetFileList"),
+                        {QStringLiteral("User"), QStringLiteral("Administrator")}, page));
     row->addStretch(1);
     return row;
 }
@@ -122,7 +121,7 @@ QLayout* BuildLocationRow(WindowControls& c, QWidget* page) {
     c.Frame_AdminLocationID =
         MakeFrame(QStringLiteral("Frame_AdminLocationID"), QStringLiteral("Admin PC"), page);
     c.Opt_AdminLocationID = new OptionButtons(QStringLiteral("Opt_AdminLocationID"),
-                                            LocationCaptions(), c.Frame_AdminLocationID);
+                                              LocationCaptions(), c.Frame_AdminLocationID);
     auto* admin = LocationGrid(c.Frame_AdminLocationID);
     for (int i = 0; i < 5; ++i) {
         c.Opt_AdminLocationID->Button(i)->setFixedHeight(kLocationRowHeight);
@@ -135,7 +134,7 @@ QLayout* BuildLocationRow(WindowControls& c, QWidget* page) {
     c.Frame_UserLocationID =
         MakeFrame(QStringLiteral("Frame_UserLocationID"), QStringLiteral("User PC"), page);
     c.Opt_UserLocationID = new OptionButtons(QStringLiteral("Opt_UserLocationID"),
-                                           LocationCaptions(), c.Frame_UserLocationID);
+                                             LocationCaptions(), c.Frame_UserLocationID);
     auto* user = LocationGrid(c.Frame_UserLocationID);
     // Room on the left of the buttons where the route lines come in.
     user->setContentsMargins(28, user->contentsMargins().top(), user->contentsMargins().right(),

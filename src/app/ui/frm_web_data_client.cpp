@@ -74,7 +74,9 @@ bool frm_WebDataClient::FileListFromUser() const {
     return c_.Opt_GetFileList->Button(0)->isChecked();
 }
 
-int frm_WebDataClient::SelectedTypeID() const { return ListItemDataValue(c_.Cmb_TypeID); }
+int frm_WebDataClient::SelectedTypeID() const {
+    return ListItemDataValue(c_.Cmb_TypeID);
+}
 
 LocationFolders frm_WebDataClient::Folders() const {
     LocationFolders folders;

@@ -19,7 +19,9 @@ OptionButtons::OptionButtons(const QString& name, const QStringList& captions, Q
     }
 }
 
-int OptionButtons::SelectedIndex() const { return SelectedOptionIndex(buttons_); }
+int OptionButtons::SelectedIndex() const {
+    return SelectedOptionIndex(buttons_);
+}
 
 int OptionButtons::CheckedIndex() const {
     for (int i = 0; i < buttons_.size(); ++i)
@@ -27,6 +29,8 @@ int OptionButtons::CheckedIndex() const {
     return -1;
 }
 
-void OptionButtons::SetIndex(int index) { SetOptionIndex(buttons_, index); }
+void OptionButtons::SetIndex(int index) {
+    SetOptionIndex(buttons_, index);
+}
 
 } // namespace quorvel

@@ -75,7 +75,8 @@ QWidget* BuildFileListColumn(WindowControls& c, QWidget* parent) {
 QLayout* BuildRunRow(WindowControls& c, QWidget* parent) {
     auto* row = new QHBoxLayout;
     c.Cmd_Process[0] = MakeButton(Indexed("Cmd_Process", 0), QStringLiteral("Process all"), parent);
-    c.Cmd_Process[1] = MakeButton(Indexed("Cmd_Process", 1), QStringLiteral("Process file"), parent);
+    c.Cmd_Process[1] =
+        MakeButton(Indexed("Cmd_Process", 1), QStringLiteral("Process file"), parent);
     c.Cmd_Cancel = MakeButton(QStringLiteral("Cmd_Cancel"), QStringLiteral("Cancel"), parent);
     c.Cmd_Close = MakeButton(QStringLiteral("Cmd_Close"), QStringLiteral("Close"), parent);
     for (auto* button : {c.Cmd_Process[0], c.Cmd_Process[1], c.Cmd_Cancel, c.Cmd_Close})

@@ -24,7 +24,9 @@ void SetCheck(QCheckBox* box, int value) {
     box->setCheckState(value != 0 ? Qt::Checked : Qt::Unchecked);
 }
 
-std::int16_t CheckOf(const QCheckBox* box) { return box->isChecked() ? 1 : 0; }
+std::int16_t CheckOf(const QCheckBox* box) {
+    return box->isChecked() ? 1 : 0;
+}
 
 std::int16_t IndexOf(const OptionButtons* group) {
     return static_cast<std::int16_t>(group->SelectedIndex());

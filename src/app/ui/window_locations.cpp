@@ -2,9 +2,9 @@
 
 #include "app/ui/frm_web_data_client.h"
 
-#include <QDir>
 #include "support/paths.h"
 #include "support/ui/folder_chooser.h"
+#include <QDir>
 
 #include <QDragEnterEvent>
 #include <QDropEvent>
@@ -86,8 +86,8 @@ bool frm_WebDataClient::eventFilter(QObject* watched, QEvent* event) {
     case QEvent::DragEnter:
     case QEvent::DragMove: {
         auto* drag = static_cast<QDragMoveEvent*>(event);
-        const bool ok = onList ? AcceptsListDrop(drag->mimeData())
-                               : AcceptsFileNameDrop(drag->mimeData());
+        const bool ok =
+            onList ? AcceptsListDrop(drag->mimeData()) : AcceptsFileNameDrop(drag->mimeData());
         if (ok) {
             drag->setDropAction(Qt::CopyAction);
             drag->accept();

@@ -58,14 +58,14 @@ void frm_WebDataClient::mnu_File_Click(int index) {
         break;
     }
     case 1: {
-        const QString chosen =
-            dialogs_.openFile(this, QStringLiteral("Open file list"), files_.LoadedFile, kListFilter);
+        const QString chosen = dialogs_.openFile(this, QStringLiteral("Open file list"),
+                                                 files_.LoadedFile, kListFilter);
         if (!chosen.isEmpty()) OpenFileList(QDir::toNativeSeparators(chosen));
         break;
     }
     case 2: {
-        const QString chosen =
-            dialogs_.saveFile(this, QStringLiteral("Save file list"), files_.LoadedFile, kListFilter);
+        const QString chosen = dialogs_.saveFile(this, QStringLiteral("Save file list"),
+                                                 files_.LoadedFile, kListFilter);
         if (chosen.isEmpty()) break;
         AddToRecentFiles(QDir::toNativeSeparators(chosen));
         // Saving under a chosen name writes the list even when it has not changed.

@@ -16,9 +16,12 @@ namespace {
 // The value a check box holds: 1 checked, 0 clear, 2 grey.
 std::int16_t CheckValue(const QCheckBox* box) {
     switch (box->checkState()) {
-    case Qt::Checked: return 1;
-    case Qt::PartiallyChecked: return 2;
-    default: return 0;
+    case Qt::Checked:
+        return 1;
+    case Qt::PartiallyChecked:
+        return 2;
+    default:
+        return 0;
     }
 }
 

@@ -19,8 +19,8 @@ RouteDrawing frm_WebDataClient::RouteLines() const {
     const QPoint origin = c_.Pic_Route[0]->mapTo(page, QPoint(0, 0));
     RouteLayout layout;
     for (int i = 0; i < 5; ++i) {
-        layout.adminTops[i] = c_.Opt_AdminLocationID->Button(i)->mapTo(page, QPoint(0, 0)).y() -
-                              origin.y();
+        layout.adminTops[i] =
+            c_.Opt_AdminLocationID->Button(i)->mapTo(page, QPoint(0, 0)).y() - origin.y();
         layout.userTops[i] =
             c_.Opt_UserLocationID->Button(i)->mapTo(page, QPoint(0, 0)).y() - origin.y();
     }
@@ -29,9 +29,9 @@ RouteDrawing frm_WebDataClient::RouteLines() const {
                         origin.x() - kGapBeforeButtons;
     RouteDrawing drawing;
     drawing.origin = origin;
-    drawing.strokes = RouteStrokes(layout, c_.Opt_AdminLocationID->SelectedIndex(),
-                                   c_.Opt_UserLocationID->SelectedIndex(),
-                                   c_.Opt_Download->SelectedIndex(), c_.Opt_Upload->SelectedIndex());
+    drawing.strokes = RouteStrokes(
+        layout, c_.Opt_AdminLocationID->SelectedIndex(), c_.Opt_UserLocationID->SelectedIndex(),
+        c_.Opt_Download->SelectedIndex(), c_.Opt_Upload->SelectedIndex());
     return drawing;
 }
 

@@ -47,7 +47,9 @@ WindowServices::~WindowServices() {
     SetFTPDisplay(nullptr, nullptr);
 }
 
-void WindowServices::Attach() { SetFTPDisplay(&window_, window_.Controls().Pic_ProgressFTP); }
+void WindowServices::Attach() {
+    SetFTPDisplay(&window_, window_.Controls().Pic_ProgressFTP);
+}
 
 void WindowServices::FillIntervals(QComboBox* combo) const {
     ComboBoxSink sink(combo);
@@ -72,12 +74,16 @@ void WindowServices::Configure(const WebSettings& s) {
     webData_->SetPictureBox(window_.Controls().Pic_ProgressFTP);
 }
 
-void WindowServices::Cancel() { webData_->SetUserCancel(1); }
+void WindowServices::Cancel() {
+    webData_->SetUserCancel(1);
+}
 
-void WindowServices::CloseFtp() { ftpClose(); }
+void WindowServices::CloseFtp() {
+    ftpClose();
+}
 
-QString WindowServices::LastDateInFile(const QString& file, int locationId, int which,
-                                       int dataType, bool display) {
+QString WindowServices::LastDateInFile(const QString& file, int locationId, int which, int dataType,
+                                       bool display) {
     return webData_->LastDateInFile(file, locationId, which, dataType, display ? 1 : 0);
 }
 

@@ -39,22 +39,21 @@ void frm_WebDataClient::EnableControls() {
     EnableRecordControls(editable, busy, sel, count, support);
 
     const bool foldersFromUser = c_.Opt_GetLocalFolders->Button(0)->isChecked();
-    for (QWidget* w : {static_cast<QWidget*>(c_.Cmd_LocateFolder[1]),
-                       static_cast<QWidget*>(c_.Txt_LocalFolder[1]),
-                       static_cast<QWidget*>(c_.Txt_UserFolder),
-                       static_cast<QWidget*>(c_.Txt_UserCurrentFolder)})
+    for (QWidget* w :
+         {static_cast<QWidget*>(c_.Cmd_LocateFolder[1]),
+          static_cast<QWidget*>(c_.Txt_LocalFolder[1]), static_cast<QWidget*>(c_.Txt_UserFolder),
+          static_cast<QWidget*>(c_.Txt_UserCurrentFolder)})
         w->setEnabled(foldersFromUser);
 
     c_.Cmd_Process[0]->setEnabled(count > 0 && !busy);
     c_.Cmd_Process[1]->setEnabled(sel >= 0 && !busy);
     c_.Cmd_Cancel->setEnabled(busy);
     c_.Cmd_Close->setEnabled(!busy);
-    for (QWidget* w : {static_cast<QWidget*>(c_.Cmd_GetCFG),
-                       static_cast<QWidget*>(c_.Cmd_GetFileList),
-                       static_cast<QWidget*>(c_.Cmd_Admin), static_cast<QWidget*>(c_.Cmd_ClearFiles),
-                       static_cast<QWidget*>(c_.Chk_GotFileList),
-                       static_cast<QWidget*>(c_.Frame_WebDetails),
-                       static_cast<QWidget*>(c_.Chk_GotPHP)})
+    for (QWidget* w :
+         {static_cast<QWidget*>(c_.Cmd_GetCFG), static_cast<QWidget*>(c_.Cmd_GetFileList),
+          static_cast<QWidget*>(c_.Cmd_Admin), static_cast<QWidget*>(c_.Cmd_ClearFiles),
+          static_cast<QWidget*>(c_.Chk_GotFileList), static_cast<QWidget*>(c_.Frame_WebDetails),
+          static_cast<QWidget*>(c_.Chk_GotPHP)})
         w->setVisible(support);
 
     const LocationFolders folders = Folders();
@@ -99,10 +98,10 @@ void frm_WebDataClient::ShowFileStatus(int sel) {
         c_.Lbl_FullFilename[i]->setText(full.ok() ? full.path : full.refusal);
         c_.Lbl_FullFilename[i]->setToolTip(c_.Lbl_FullFilename[i]->text());
         c_.Lbl_LastDate[i]->setText(
-            full.ok() ? services_->LastDateInFile(full.path, c_.Opt_UserLocationID->SelectedIndex(),
-                                                  i, SelectedTypeID(),
-                                                  c_.chk_ShowDate[i]->isChecked())
-                      : QString());
+            full.ok()
+                ? services_->LastDateInFile(full.path, c_.Opt_UserLocationID->SelectedIndex(), i,
+                                            SelectedTypeID(), c_.chk_ShowDate[i]->isChecked())
+                : QString());
     }
     ShowLocalStatus(FullFilename(kOnThisPc));
     ShowRemoteStatus(FullFilename(kAtService));

@@ -22,9 +22,9 @@ QLineEdit* AddEditRow(QGridLayout* grid, int row, const QString& caption, const 
 QGroupBox* BuildScheduleFrame(WindowControls& c, QWidget* page) {
     c.Frame1 = MakeFrame(QStringLiteral("Frame1"), QStringLiteral("Download"), page);
     auto* grid = new QGridLayout(c.Frame1);
-    c.Opt_Automatic = new OptionButtons(QStringLiteral("Opt_Automatic"),
-                                      {QStringLiteral("Manual"), QStringLiteral("Automatic every")},
-                                      c.Frame1);
+    c.Opt_Automatic =
+        new OptionButtons(QStringLiteral("Opt_Automatic"),
+                          {QStringLiteral("Manual"), QStringLiteral("Automatic every")}, c.Frame1);
     c.Cmb_interval = new QComboBox(c.Frame1);
     c.Cmb_interval->setObjectName(QStringLiteral("Cmb_interval"));
     c.Cmb_interval->setEditable(true);
@@ -36,8 +36,7 @@ QGroupBox* BuildScheduleFrame(WindowControls& c, QWidget* page) {
     QLabel** values[] = {&c.Lbl_Due, &c.Lbl_Now, &c.Lbl_NextDownloadDue, &c.Lbl_LastDownload};
     const char* names[] = {"Lbl_Due", "Lbl_Now", "Lbl_NextDownloadDue", "Lbl_LastDownload"};
     for (int i = 0; i < 4; ++i) {
-        grid->addWidget(MakeLabel(QLatin1String(captions[i]), c.Frame1), 2 + i, 0,
-                        Qt::AlignRight);
+        grid->addWidget(MakeLabel(QLatin1String(captions[i]), c.Frame1), 2 + i, 0, Qt::AlignRight);
         *values[i] = MakeLabel(QString(), c.Frame1, QLatin1String(names[i]));
         (*values[i])->setMinimumWidth(170);
         grid->addWidget(*values[i], 2 + i, 1, 1, 2);
@@ -53,11 +52,10 @@ QWidget* BuildMainTab(WindowControls& c) {
     page->setObjectName(QStringLiteral("MainPage"));
     auto* layout = new QVBoxLayout(page);
     auto* grid = new QGridLayout;
-    c.Txt_CFG_URL =
-        AddEditRow(grid, 0, QStringLiteral("CFG file web address:"), QStringLiteral("Txt_CFG_URL"),
-                   page);
-    c.Txt_UserID = AddEditRow(grid, 1, QStringLiteral("User ID:"), QStringLiteral("Txt_UserID"),
-                              page);
+    c.Txt_CFG_URL = AddEditRow(grid, 0, QStringLiteral("CFG file web address:"),
+                               QStringLiteral("Txt_CFG_URL"), page);
+    c.Txt_UserID =
+        AddEditRow(grid, 1, QStringLiteral("User ID:"), QStringLiteral("Txt_UserID"), page);
     c.Txt_Password =
         AddEditRow(grid, 2, QStringLiteral("Password:"), QStringLiteral("Txt_Password"), page);
     c.Txt_Password->setEchoMode(QLineEdit::Password);
@@ -89,11 +87,12 @@ QWidget* BuildFoldersTab(WindowControls& c) {
     auto* frameLayout = new QHBoxLayout(c.Frame9);
     c.Opt_GetLocalFolders =
         new OptionButtons(QStringLiteral("Opt_GetLocalFolders"),
-                        {QStringLiteral("User"), QStringLiteral("Administrator")}, c.Frame9);
+                          {QStringLiteral("User"), QStringLiteral("Administrator")}, c.Frame9);
     frameLayout->addWidget(c.Opt_GetLocalFolders->Button(0));
     frameLayout->addWidget(c.Opt_GetLocalFolders->Button(1));
     top->addWidget(c.Frame9);
-    c.Chk_GotPHP = MakeCheck(QStringLiteral("Chk_GotPHP"), QStringLiteral("Got user folders"), page);
+    c.Chk_GotPHP =
+        MakeCheck(QStringLiteral("Chk_GotPHP"), QStringLiteral("Got user folders"), page);
     top->addWidget(c.Chk_GotPHP);
     top->addStretch(1);
     layout->addLayout(top);
@@ -102,8 +101,8 @@ QWidget* BuildFoldersTab(WindowControls& c) {
     const char* captions[] = {"Application folder:", "Data folder:"};
     const char* words[] = {"application", "data"};
     for (int i = 0; i < 2; ++i) {
-        c.Txt_LocalFolder[i] = AddEditRow(grid, i, QLatin1String(captions[i]),
-                                          Indexed("Txt_LocalFolder", i), page);
+        c.Txt_LocalFolder[i] =
+            AddEditRow(grid, i, QLatin1String(captions[i]), Indexed("Txt_LocalFolder", i), page);
         // The word the folder chooser puts into its prompt.
         c.Txt_LocalFolder[i]->setProperty("tag", QLatin1String(words[i]));
         c.Cmd_LocateFolder[i] =
@@ -130,13 +129,13 @@ QWidget* BuildNewSeasonTab(WindowControls& c) {
     auto* layout = new QVBoxLayout(page);
     c.Frame2 = MakeFrame(QStringLiteral("Frame2"), QStringLiteral("Download which dates"), page);
     auto* frame = new QGridLayout(c.Frame2);
-    c.Opt_Whichdates = new OptionButtons(QStringLiteral("Opt_Whichdates"),
-                                       {QStringLiteral("New data"), QStringLiteral("Data after")},
-                                       c.Frame2);
+    c.Opt_Whichdates =
+        new OptionButtons(QStringLiteral("Opt_Whichdates"),
+                          {QStringLiteral("New data"), QStringLiteral("Data after")}, c.Frame2);
     c.Txt_AfterDate = MakeEdit(QStringLiteral("Txt_AfterDate"), c.Frame2);
-    c.lbl_Help[0] = MakeLabel(
-        QStringLiteral("To only download data from the end of last seasons data file"), c.Frame2,
-        Indexed("lbl_Help", 0));
+    c.lbl_Help[0] =
+        MakeLabel(QStringLiteral("To only download data from the end of last seasons data file"),
+                  c.Frame2, Indexed("lbl_Help", 0));
     c.lbl_Help[0]->setWordWrap(true);
     frame->addWidget(c.Opt_Whichdates->Button(0), 0, 0);
     frame->addWidget(c.Opt_Whichdates->Button(1), 1, 0);
@@ -186,15 +185,15 @@ QWidget* BuildOptionsTab(WindowControls& c) {
         MakeFrame(QStringLiteral("Frame_WebDetails"), QStringLiteral("Web details"), page);
     auto* grid = new QGridLayout(c.Frame_WebDetails);
     auto* f = c.Frame_WebDetails;
-    c.Txt_ftpServer = AddEditRow(grid, 0, QStringLiteral("ftp URL:"),
-                                 QStringLiteral("Txt_ftpServer"), f);
-    c.txt_ftpUserID = AddEditRow(grid, 1, QStringLiteral("ftp UserID:"),
-                                 QStringLiteral("txt_ftpUserID"), f);
-    c.Txt_ftpPassword = AddEditRow(grid, 2, QStringLiteral("ftp pwd:"),
-                                   QStringLiteral("Txt_ftpPassword"), f);
+    c.Txt_ftpServer =
+        AddEditRow(grid, 0, QStringLiteral("ftp URL:"), QStringLiteral("Txt_ftpServer"), f);
+    c.txt_ftpUserID =
+        AddEditRow(grid, 1, QStringLiteral("ftp UserID:"), QStringLiteral("txt_ftpUserID"), f);
+    c.Txt_ftpPassword =
+        AddEditRow(grid, 2, QStringLiteral("ftp pwd:"), QStringLiteral("Txt_ftpPassword"), f);
     c.Txt_ftpPassword->setEchoMode(QLineEdit::Password);
-    c.Txt_httpServer = AddEditRow(grid, 3, QStringLiteral("http Server:"),
-                                  QStringLiteral("Txt_httpServer"), f);
+    c.Txt_httpServer =
+        AddEditRow(grid, 3, QStringLiteral("http Server:"), QStringLiteral("Txt_httpServer"), f);
     c.Txt_WebFolder =
         AddEditRow(grid, 4, QStringLiteral("Folder:"), QStringLiteral("Txt_WebFolder"), f);
     c.Chk_GotSecure = MakeCheck(QStringLiteral("Chk_GotSecure"), QStringLiteral("Got Secure"), f);

@@ -1,0 +1,159 @@
+// Start-up, the settings file and shut-down, seen through the window.
+
+#include "window_fixture.h"
+
+#include "support/ini_store.h"
+#include "support/program_home.h"
+
+#include <QDate>
+#include <QDir>
+#include <QFile>
+
+namespace quorvel::testing {
+namespace {
+
+class SettingsTest : public WindowTest {
+protected:
+    QString Stored(const QString& key) {
+        return IniStore(ProgramHome::SettingsFile()).Read("General", key, "<missing>");
+    }
+    QString AutostartEntry() {
+        return home.File("autostart/" + ProgramHome::ProgramName() + ".desktop");
+    }
+};
+
+TEST_F(SettingsTest, FirstStartWithoutSettingsUsesTheDefaults) {
+    Start();
+    EXPECT_EQ(C().Txt_LocalFolder[0]->text(), home.Path());
+    EXPECT_EQ(C().Txt_LocalFolder[1]->text(), home.Path());
+    EXPECT_EQ(C().Opt_GetFileList->CheckedIndex(), 1);
+    EXPECT_EQ(C().Opt_GetLocalFolders->CheckedIndex(), 1);
+    EXPECT_EQ(C().Opt_Automatic->CheckedIndex(), 0);
+    EXPECT_EQ(C().Cmb_interval->currentText(), "3 hrs");
+    EXPECT_EQ(C().Lbl_LastDownload->text(), "never");
+    EXPECT_EQ(C().Txt_AfterDate->text(),
+              QStringLiteral("1 Nov %1").arg(QDate::currentDate().year()));
+    EXPECT_TRUE(C().chk_ShowDate[0]->isChecked());
+    EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("files.txt"));
+    EXPECT_EQ(window->Recent().Entry(1), home.File("files.txt"));
+    EXPECT_EQ(window->windowTitle(), "TALU Quorvel");
+    EXPECT_EQ(C().Cmb_interval->count(), 6);
+    EXPECT_FALSE(window->StartedMinimised());
+}
+
+TEST_F(SettingsTest, FirstActivationLoadsTheListOfTheFirstRecentEntry) {
+    UserMaintainsList();
+    WriteList({Line("A", "a.csv")}, "lists/season.txt");
+    Setting("File1", home.File("lists/season.txt"));
+    Start();
+    EXPECT_EQ(ListNames(), QStringList({"A"}));
+    EXPECT_EQ(C().Lst_Files->currentRow(), 0);
+    EXPECT_EQ(C().Txt_Name->text(), "A");
+    EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("lists/season.txt"));
+}
+
+TEST_F(SettingsTest, FieldsSurviveARestart) {
+    Start();
+    C().Txt_CFG_URL->setText("http://example.test/cfg.txt");
+    C().Txt_UserID->setText("farmer");
+    C().Txt_Password->setText("");
+    C().Txt_LocalFolder[1]->setText(home.File("data"));
+    C().chk_ShowDate[0]->setChecked(false);
+    C().chk_ShowDate[1]->setChecked(true);
+    C().Opt_GetFileList->Button(0)->click();
+    C().Opt_GetLocalFolders->Button(0)->click();
+    C().Opt_Automatic->Button(1)->click();
+    C().Cmb_interval->setCurrentText("6 hours");
+    C().Chk_DownloadOnly->setChecked(true);
+    C().Opt_Whichdates->Button(1)->click();
+    C().Txt_AfterDate->setText("1 Nov 2023");
+    Close();
+
+    // An emptied field is written as the word Null.
+    EXPECT_EQ(Stored("Password"), "Null");
+    EXPECT_EQ(Stored("ShowDate1"), "1");
+    EXPECT_NE(Stored("Left"), "<missing>");
+
+    Start();
+    EXPECT_EQ(C().Txt_CFG_URL->text(), "http://example.test/cfg.txt");
+    EXPECT_EQ(C().Txt_UserID->text(), "farmer");
+    EXPECT_EQ(C().Txt_Password->text(), "");
+    EXPECT_EQ(C().Txt_LocalFolder[1]->text(), home.File("data"));
+    EXPECT_FALSE(C().chk_ShowDate[0]->isChecked());
+    // "ShowDate1" is written but never read back.
+    EXPECT_FALSE(C().chk_ShowDate[1]->isChecked());
+    EXPECT_EQ(C().Opt_GetFileList->CheckedIndex(), 0);
+    EXPECT_EQ(C().Opt_GetLocalFolders->CheckedIndex(), 0);
+    EXPECT_EQ(C().Opt_Automatic->CheckedIndex(), 1);
+    EXPECT_EQ(C().Cmb_interval->currentText(), "6 hours");
+    EXPECT_TRUE(C().Chk_DownloadOnly->isChecked());
+    EXPECT_EQ(C().Opt_Whichdates->CheckedIndex(), 1);
+    EXPECT_EQ(C().Txt_AfterDate->text(), "1 Nov 2023");
+}
+
+TEST_F(SettingsTest, ScheduledStartIsMinimisedAndDoesNotInitialise) {
+    UserMaintainsList();
+    WriteList({Line("A", "a.csv")});
+    Start({"--other", "/s"});
+    EXPECT_TRUE(window->StartedMinimised());
+    EXPECT_TRUE(window->isMinimized());
+    EXPECT_EQ(C().Lst_Files->count(), 0);
+    // Minimised, the status shows in the caption.
+    window->ShowStatus("Due in 02:00");
+    EXPECT_EQ(window->windowTitle(), "Due in 02:00");
+}
+
+TEST_F(SettingsTest, UnreadableOptionIndexEndsTheLoadWithAReport) {
+    Setting("GetLocalFolders", "many");
+    Start();
+    ASSERT_FALSE(ports.prompter.shown.empty());
+    EXPECT_TRUE(ports.prompter.shown[0].message.contains("Quorvel:Load"))
+        << ports.prompter.shown[0].message.toStdString();
+    // The window is not left locked.
+    EXPECT_FALSE(window->Flags().IsLoading);
+}
+
+TEST_F(SettingsTest, RunAtStartUpWritesAndRemovesTheAutostartEntry) {
+    Start();
+    EXPECT_FALSE(C().Chk_RunAtStartUp->isChecked());
+    C().Chk_RunAtStartUp->click();
+    ASSERT_TRUE(QFile::exists(AutostartEntry()));
+    QFile entry(AutostartEntry());
+    ASSERT_TRUE(entry.open(QIODevice::ReadOnly));
+    EXPECT_TRUE(entry.readAll().contains("/S"));
+    entry.close();
+    Close();
+
+    Start();
+    EXPECT_TRUE(C().Chk_RunAtStartUp->isChecked());
+    C().Chk_RunAtStartUp->click();
+    EXPECT_FALSE(QFile::exists(AutostartEntry()));
+}
+
+TEST_F(SettingsTest, ListIsSavedAtExitOnlyWhenChanged) {
+    UserMaintainsList();
+    WriteList({Line("A", "a.csv")});
+    const QByteArray before = home.Read("files.txt");
+    Start();
+    Close();
+    EXPECT_EQ(home.Read("files.txt"), before);
+
+    Start();
+    C().Txt_Name->setText("Renamed");
+    window->StoreCurrentRecord();
+    Close();
+    EXPECT_TRUE(home.Read("files.txt").contains("~Renamed~"));
+}
+
+TEST_F(SettingsTest, UnstoredFieldEditsAreNotWrittenAtExit) {
+    UserMaintainsList();
+    WriteList({Line("A", "a.csv")});
+    Start();
+    C().Txt_FileName->setText("edited.csv");
+    Close();
+    // The list changed flag was set, so the list is written, but from the records.
+    EXPECT_FALSE(home.Read("files.txt").contains("edited.csv"));
+}
+
+} // namespace
+} // namespace quorvel::testing
