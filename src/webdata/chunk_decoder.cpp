@@ -42,7 +42,7 @@ ChunkDecoder::Result ChunkDecoder::EndOfLine(QByteArrayView line) {
             if (size > kChunkLimit)
                 return Result::Invalid;
         }
-        const QByteArrayView rest = line.mid(digits).trimmed();
+        const QByteArrayView rest = line.sliced(digits).trimmed();
         if (digits == 0 || (!rest.isEmpty() && !rest.startsWith(';')))
             return Result::Invalid;
         remaining_ = size;
@@ -76,14 +76,14 @@ ChunkDecoder::Result ChunkDecoder::Decode(QByteArrayView input, QByteArray& outp
         if (stage_ == Stage::Data) {
             const qsizetype take = static_cast<qsizetype>(
                 std::min<std::int64_t>(remaining_, input.size() - consumed));
-            output.append(input.mid(consumed, take));
+            output.append(input.sliced(consumed, take));
             consumed += take;
             remaining_ -= take;
             if (remaining_ == 0)
                 stage_ = Stage::DataEnd;
             continue;
         }
-        const QByteArrayView rest = input.mid(consumed);
+        const QByteArrayView rest = input.sliced(consumed);
         const qsizetype lf = rest.indexOf('\n');
         if (lf < 0) {
             line_.append(rest);

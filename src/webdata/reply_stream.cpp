@@ -37,7 +37,7 @@ void ReplyStream::Compact() {
 }
 
 void ReplyStream::StartChunked() {
-    raw_.prepend(QByteArrayView(text_).mid(pos_));
+    raw_.prepend(QByteArrayView(text_).sliced(pos_));
     text_.clear();
     pos_ = 0;
     chunked_ = true;

@@ -72,7 +72,7 @@ void CTALUWebData::ProcessReply(QByteArrayView line) {
             break;
         case kLastDate:
             if (ok) {
-                ProcessLastDate(TrimSpaces(Text(line.mid(2))));
+                ProcessLastDate(TrimSpaces(Text(line.sliced(2))));
                 lastCommand_.clear();
                 replyKind_ = kNothing;
             }
@@ -166,7 +166,7 @@ void CTALUWebData::ProcessHeaderLine(QByteArrayView line) {
     if (colon < 0)
         return;
     const QByteArray name = line.first(colon).trimmed().toByteArray().toLower();
-    const QByteArray value = line.mid(colon + 1).trimmed().toByteArray().toLower();
+    const QByteArray value = line.sliced(colon + 1).trimmed().toByteArray().toLower();
     if (name == "transfer-encoding")
         chunkedBody_ = value.contains("chunked");
     else if (name == "connection" && value.contains("close"))
