@@ -16,26 +16,22 @@ std::optional<QString> BeforeHour24(const QString& text) {
     static const QRegularExpression hour24(
         QStringLiteral("^\\s*(?:(.*\\S)\\s+)?24:00(?::00)?\\s*$"));
     const QRegularExpressionMatch m = hour24.match(text);
-    if (!m.hasMatch())
-        return std::nullopt;
+    if (!m.hasMatch()) return std::nullopt;
     return m.captured(1);
 }
 
 } // namespace
 
 DateValue MyTimeValue(const QString& text) {
-    if (BeforeHour24(text))
-        return 1.0;
-    if (const std::optional<DateValue> v = ParseDateText(text))
-        return TimePart(*v);
+    if (BeforeHour24(text)) return 1.0;
+    if (const std::optional<DateValue> v = ParseDateText(text)) return TimePart(*v);
     WriteLogFile(QStringLiteral("Time error: ") + text);
     return 0;
 }
 
 DateValue MyDateValue(const QString& text) {
     const std::optional<QString> before = BeforeHour24(text);
-    if (before && before->isEmpty())
-        return 0;
+    if (before && before->isEmpty()) return 0;
     if (const std::optional<DateValue> v = ParseDateText(before ? *before : text))
         return DatePart(*v);
     WriteLogFile(QStringLiteral("Date error:") + text);
@@ -43,8 +39,7 @@ DateValue MyDateValue(const QString& text) {
 }
 
 DateValue DateTimeValue(const QString& text) {
-    if (text == QLatin1String("0"))
-        return 0;
+    if (text == QLatin1String("0")) return 0;
     return MyTimeValue(text) + MyDateValue(text);
 }
 

@@ -10,7 +10,7 @@
 namespace quorvel {
 
 struct LastLine {
-    QByteArray line;         // empty when the file holds no non-empty line
+    QByteArray line;             // empty when the file holds no non-empty line
     bool endsWithLineEnd = true; // the file is empty or its last byte is CR or LF
 };
 

@@ -20,24 +20,20 @@ const QStringList& DataTypeNames() {
 namespace {
 
 const QString& Field(const QStringList& fields, qsizetype index) {
-    if (index >= fields.size())
-        throw WebDataError(QStringLiteral("Subscript out of range"));
+    if (index >= fields.size()) throw WebDataError(QStringLiteral("Subscript out of range"));
     return fields.at(index);
 }
 
 int Int16(QStringView text) {
     const std::optional<std::int16_t> v = ToInt16(text);
-    if (!v)
-        throw WebDataError(QStringLiteral("Type mismatch"));
+    if (!v) throw WebDataError(QStringLiteral("Type mismatch"));
     return *v;
 }
 
 // Two-digit years follow the usual window: 0-29 are 2000-2029, 30-99 are 1930-1999.
 int FullYear(int year) {
-    if (year >= 0 && year < 30)
-        return year + 2000;
-    if (year >= 30 && year < 100)
-        return year + 1900;
+    if (year >= 0 && year < 30) return year + 2000;
+    if (year >= 30 && year < 100) return year + 1900;
     return year;
 }
 
@@ -58,8 +54,7 @@ DateValue CsiDate(const QStringList& f) {
     const double year = RoundHalfEven(ValDouble(Field(f, 1)));
     const double day = ValDouble(Field(f, 2));
     const std::int32_t hhmm = ValLong(Field(f, 3));
-    if (std::fabs(year) > 9999)
-        throw WebDataError(QStringLiteral("Overflow"));
+    if (std::fabs(year) > 9999) throw WebDataError(QStringLiteral("Overflow"));
     return CalendarDate(static_cast<int>(year), 1, 1) + day - 1 + (hhmm / 100) / 24.0 +
            (hhmm % 100) / 1440.0;
 }
@@ -95,8 +90,7 @@ QStringList LineFields(const QString& line) {
 LineDate DateOfLine(const QString& line, int dataType) {
     LineDate result;
     const QStringList f = LineFields(line);
-    if (f.size() < 2)
-        return result;
+    if (f.size() < 2) return result;
     result.found = true;
     result.firstField = f.at(0);
     switch (dataType) {

@@ -24,10 +24,10 @@ enum DataType : int {
 const QStringList& DataTypeNames();
 
 struct LineDate {
-    bool found = false;      // a date was read, or the type reads none
-    bool hasDate = false;    // value holds the line's date
+    bool found = false;   // a date was read, or the type reads none
+    bool hasDate = false; // value holds the line's date
     DateValue value = 0;
-    QString firstField;      // field 0, with quotes removed
+    QString firstField; // field 0, with quotes removed
 };
 
 // The fields of a line: separated by tab when it has one, else by comma when it

@@ -29,33 +29,27 @@ void OutputFile::Open(const QString& path, bool& created) {
     }
     file_.setFileName(path);
     const QIODevice::OpenMode mode = created ? QIODevice::WriteOnly : QIODevice::Append;
-    if (!file_.open(mode))
-        throw WebDataError(file_.errorString() + QStringLiteral(": ") + path);
+    if (!file_.open(mode)) throw WebDataError(file_.errorString() + QStringLiteral(": ") + path);
     pending_.reserve(kGather + 4096);
-    if (needsLineEnd)
-        pending_.append("\r\n");
+    if (needsLineEnd) pending_.append("\r\n");
 }
 
 void OutputFile::WriteLine(QByteArrayView line) {
     pending_.append(line);
     pending_.append("\r\n", 2);
-    if (pending_.size() >= kGather)
-        Flush();
+    if (pending_.size() >= kGather) Flush();
 }
 
 void OutputFile::Flush() {
-    if (pending_.isEmpty())
-        return;
+    if (pending_.isEmpty()) return;
     const qint64 written = file_.write(pending_);
     const bool ok = written == pending_.size() && file_.flush();
     pending_.clear();
-    if (!ok)
-        throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
+    if (!ok) throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
 }
 
 void OutputFile::Close() {
-    if (!file_.isOpen())
-        return;
+    if (!file_.isOpen()) return;
     try {
         Flush();
     } catch (const WebDataError&) {

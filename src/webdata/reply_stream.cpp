@@ -25,9 +25,13 @@ void ReplyStream::Clear() {
     decoder_.Reset();
 }
 
-bool ReplyStream::IsEmpty() const { return pos_ >= text_.size() && raw_.isEmpty(); }
+bool ReplyStream::IsEmpty() const {
+    return pos_ >= text_.size() && raw_.isEmpty();
+}
 
-QByteArray ReplyStream::Unconsumed() const { return text_.mid(pos_) + raw_; }
+QByteArray ReplyStream::Unconsumed() const {
+    return text_.mid(pos_) + raw_;
+}
 
 void ReplyStream::Compact() {
     if (pos_ > 0) {
@@ -37,7 +41,7 @@ void ReplyStream::Compact() {
 }
 
 void ReplyStream::StartChunked() {
-    raw_.prepend(QByteArrayView(text_).mid(pos_));
+    raw_.prepend(QByteArrayView(text_).sliced(pos_));
     text_.clear();
     pos_ = 0;
     chunked_ = true;
@@ -48,8 +52,7 @@ bool ReplyStream::DecodeChunks(bool& bodyEnded) {
     qsizetype used = 0;
     const ChunkDecoder::Result r = decoder_.Decode(raw_, text_, used);
     raw_.remove(0, used);
-    if (r == ChunkDecoder::Result::Invalid)
-        return false;
+    if (r == ChunkDecoder::Result::Invalid) return false;
     bodyEnded = r == ChunkDecoder::Result::Done;
     return true;
 }
@@ -57,13 +60,11 @@ bool ReplyStream::DecodeChunks(bool& bodyEnded) {
 ReplyStream::Outcome ReplyStream::Drain(LineSink& sink) {
     for (;;) {
         bool bodyEnded = false;
-        if (chunked_ && !DecodeChunks(bodyEnded))
-            return Outcome::BadChunking;
+        if (chunked_ && !DecodeChunks(bodyEnded)) return Outcome::BadChunking;
         bool restart = false;
         while (!restart) {
             const qsizetype lf = text_.indexOf('\n', pos_);
-            if (lf < 0)
-                break;
+            if (lf < 0) break;
             const QByteArrayView line = WithoutCr(QByteArrayView(text_).sliced(pos_, lf - pos_));
             pos_ = lf + 1;
             switch (sink.OnLine(line)) {
@@ -78,8 +79,7 @@ ReplyStream::Outcome ReplyStream::Drain(LineSink& sink) {
                 return Outcome::Ok;
             }
         }
-        if (restart)
-            continue;
+        if (restart) continue;
         if (bodyEnded) {
             if (pos_ < text_.size()) {
                 const QByteArray tail = text_.mid(pos_);

@@ -26,19 +26,21 @@ QString Escape(const QString& text, bool controls) {
 }
 
 bool AllDigits(QStringView text) {
-    if (text.isEmpty())
-        return false;
+    if (text.isEmpty()) return false;
     for (const QChar c : text)
-        if (!c.isDigit())
-            return false;
+        if (!c.isDigit()) return false;
     return true;
 }
 
 } // namespace
 
-QString URLEncode(const QString& text) { return Escape(text, false); }
+QString URLEncode(const QString& text) {
+    return Escape(text, false);
+}
 
-QString EscapeQueryValue(const QString& text) { return Escape(text, true); }
+QString EscapeQueryValue(const QString& text) {
+    return Escape(text, true);
+}
 
 QString FolderPath(const QString& webFolder) {
     QString path = webFolder;
@@ -52,8 +54,7 @@ HostPort SplitHostPort(const QString& remoteHost, int fallbackPort) {
     HostPort result{remoteHost, fallbackPort};
     if (remoteHost.startsWith(QLatin1Char('['))) {
         const qsizetype close = remoteHost.indexOf(QLatin1Char(']'));
-        if (close < 0)
-            return result;
+        if (close < 0) return result;
         result.host = remoteHost.mid(1, close - 1);
         const QStringView rest = QStringView(remoteHost).mid(close + 1);
         if (rest.startsWith(QLatin1Char(':')) && AllDigits(rest.mid(1)))
@@ -77,8 +78,8 @@ bool IsGetCommand(int commandIndex) {
 }
 
 QStringList RequestLines(const RequestFields& f) {
-    static const std::array<const char*, 8> names = {
-        "cmd", "user", "pwd", "file", "dt", "filelocation", "trace", "date"};
+    static const std::array<const char*, 8> names = {"cmd", "user",         "pwd",   "file",
+                                                     "dt",  "filelocation", "trace", "date"};
     const std::array<QString, 8> values = {
         EscapeQueryValue(f.command),
         EscapeQueryValue(f.user),
@@ -91,17 +92,15 @@ QStringList RequestLines(const RequestFields& f) {
     };
     QString query;
     for (std::size_t i = 0; i < names.size(); ++i) {
-        if (values[i].isEmpty())
-            continue;
+        if (values[i].isEmpty()) continue;
         query += query.isEmpty() ? QLatin1Char('?') : QLatin1Char('&');
         query += QLatin1String(names[i]) + QLatin1Char('=') + values[i];
     }
-    const QString method = IsGetCommand(f.commandIndex) ? QStringLiteral("GET")
-                                                        : QStringLiteral("POST");
+    const QString method =
+        IsGetCommand(f.commandIndex) ? QStringLiteral("GET") : QStringLiteral("POST");
     return {method + QStringLiteral(" http://") + f.host + FolderPath(f.webFolder) +
                 QStringLiteral("wd.php") + query + QStringLiteral(" HTTP/1.1"),
-            QStringLiteral("Host: ") + f.host, QStringLiteral("User-Agent: ") + f.agent,
-            QString()};
+            QStringLiteral("Host: ") + f.host, QStringLiteral("User-Agent: ") + f.agent, QString()};
 }
 
 QString MaskPassword(const QString& line) {

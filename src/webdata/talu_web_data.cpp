@@ -31,11 +31,12 @@ CTALUWebData::~CTALUWebData() {
     } catch (const WebDataError&) {
         // The object is going away; there is no one left to tell.
     }
-    if (socket_)
-        socket_->Close();
+    if (socket_) socket_->Close();
 }
 
-void CTALUWebData::SetUserCancel(int value) { userCancel_ = value != 0; }
+void CTALUWebData::SetUserCancel(int value) {
+    userCancel_ = value != 0;
+}
 
 void CTALUWebData::EnableLog(int which, int value) {
     if (which >= 0 && which < static_cast<int>(enableLog_.size()))
@@ -43,11 +44,9 @@ void CTALUWebData::EnableLog(int which, int value) {
 }
 
 void CTALUWebData::MyWinsock(SocketControl* socket) {
-    if (socket_)
-        disconnect(socket_, nullptr, this, nullptr);
+    if (socket_) disconnect(socket_, nullptr, this, nullptr);
     socket_ = socket;
-    if (!socket)
-        return;
+    if (!socket) return;
     connect(socket, &SocketControl::Closed, this, [this](int) { Disconnect(); });
     connect(socket, &SocketControl::Connected, this, &CTALUWebData::Connect);
     connect(socket, &SocketControl::ConnectionRequested, this, &CTALUWebData::ConnectionRequest);
@@ -58,14 +57,12 @@ void CTALUWebData::MyWinsock(SocketControl* socket) {
 }
 
 void CTALUWebData::SetUserID(const QString& userId) {
-    if (!userId.isEmpty() && userId != userId_)
-        Disconnect();
+    if (!userId.isEmpty() && userId != userId_) Disconnect();
     userId_ = userId;
 }
 
 void CTALUWebData::SetPassword(const QString& password) {
-    if (!password.isEmpty() && password != password_)
-        Disconnect();
+    if (!password.isEmpty() && password != password_) Disconnect();
     password_ = password;
 }
 
@@ -89,20 +86,31 @@ bool CTALUWebData::SendNewData(const QString& localFilename, int location, int d
     return true;
 }
 
-QString CTALUWebData::URLEncode(const QString& text) const { return quorvel::URLEncode(text); }
+QString CTALUWebData::URLEncode(const QString& text) const {
+    return quorvel::URLEncode(text);
+}
 
-QString CTALUWebData::WinsockStatus(std::int32_t code) const { return SocketStateText(code); }
+QString CTALUWebData::WinsockStatus(std::int32_t code) const {
+    return SocketStateText(code);
+}
 
-void CTALUWebData::LoadComboWithIPAddresses(ComboSink& combo) const { LoadIPAddresses(combo); }
-void CTALUWebData::LoadComboWithIntervals(ComboSink& combo) const { LoadIntervals(combo); }
-void CTALUWebData::LoadComboWithDataTypes(ComboSink& combo) const { LoadDataTypes(combo); }
+void CTALUWebData::LoadComboWithIPAddresses(ComboSink& combo) const {
+    LoadIPAddresses(combo);
+}
+void CTALUWebData::LoadComboWithIntervals(ComboSink& combo) const {
+    LoadIntervals(combo);
+}
+void CTALUWebData::LoadComboWithDataTypes(ComboSink& combo) const {
+    LoadDataTypes(combo);
+}
 
-void CTALUWebData::SetEncryptKey(const QString& key) { encryptKey_ = ExpandKey(key); }
+void CTALUWebData::SetEncryptKey(const QString& key) {
+    encryptKey_ = ExpandKey(key);
+}
 
 QString CTALUWebData::EncryptSimple(const QString& text) {
     const std::optional<QString> result = quorvel::EncryptSimple(text, encryptKey_);
-    if (result)
-        return *result;
+    if (result) return *result;
     ErrorReport(QStringLiteral("EncryptSimple"), QStringLiteral("Subscript out of range"));
     return {};
 }
@@ -110,26 +118,24 @@ QString CTALUWebData::EncryptSimple(const QString& text) {
 // ---- traces and reports ----
 
 void CTALUWebData::TraceSent(const QString& text) {
-    if (Logging(1))
-        LogLine(QStringLiteral("S>") + text);
+    if (Logging(1)) LogLine(QStringLiteral("S>") + text);
 }
 
 void CTALUWebData::TraceReceived(const QString& text) {
-    if (Logging(2))
-        LogLine(QStringLiteral("R>") + text);
+    if (Logging(2)) LogLine(QStringLiteral("R>") + text);
 }
 
 void CTALUWebData::TraceReceivedData(const QString& text) {
-    if (Logging(4))
-        LogLine(QStringLiteral("RD>") + text);
+    if (Logging(4)) LogLine(QStringLiteral("RD>") + text);
 }
 
 void CTALUWebData::TraceDebug(const QString& text) {
-    if (Logging(3))
-        Q_EMIT ShowLog(QStringLiteral("D>") + text);
+    if (Logging(3)) Q_EMIT ShowLog(QStringLiteral("D>") + text);
 }
 
-void CTALUWebData::ShowStatusText(const QString& text) { Q_EMIT ShowStatus(text); }
+void CTALUWebData::ShowStatusText(const QString& text) {
+    Q_EMIT ShowStatus(text);
+}
 
 void CTALUWebData::ReportAsyncError(const QString& text) {
     LogLine(QStringLiteral("A-error> ") + text);
@@ -144,17 +150,15 @@ void CTALUWebData::LogLine(const QString& text) {
 void CTALUWebData::ErrorReport(const QString& where, const QString& description) {
     Q_EMIT ShowStatus(description + QStringLiteral("|") + where);
     Prompter& prompter = prompter_ ? *prompter_ : CurrentPrompter();
-    const int answer = prompter.SystemMsgBox(description + QStringLiteral("\r\nTALUWebData:") +
-                                                 where +
-                                                 QStringLiteral("\r\nDo you want to debug ?"),
-                                             kButtonsYesNo | kIconQuestion);
-    if (answer == kAnswerYes && endProgram_)
-        endProgram_();
+    const int answer =
+        prompter.SystemMsgBox(description + QStringLiteral("\r\nTALUWebData:") + where +
+                                  QStringLiteral("\r\nDo you want to debug ?"),
+                              kButtonsYesNo | kIconQuestion);
+    if (answer == kAnswerYes && endProgram_) endProgram_();
 }
 
 void CTALUWebData::ShowBusy() {
-    if (busyShown_)
-        return;
+    if (busyShown_) return;
     if (BusyPointer* busy = CurrentBusyPointer()) {
         busy->Push();
         busyShown_ = true;
@@ -162,11 +166,9 @@ void CTALUWebData::ShowBusy() {
 }
 
 void CTALUWebData::RestorePointer() {
-    if (!busyShown_)
-        return;
+    if (!busyShown_) return;
     busyShown_ = false;
-    if (BusyPointer* busy = CurrentBusyPointer())
-        busy->Pop();
+    if (BusyPointer* busy = CurrentBusyPointer()) busy->Pop();
 }
 
 } // namespace quorvel

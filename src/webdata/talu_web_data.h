@@ -196,7 +196,7 @@ private:
     // What the head of the reply in progress announced.
     bool chunkedBody_ = false;
     bool closeAfterReply_ = false;
-    bool replyEnded_ = false;    // a final line was handled by the last OnLine
+    bool replyEnded_ = false;     // a final line was handled by the last OnLine
     bool dropAfterDrain_ = false; // the service closes after this reply
     // Progress of received records is drawn at most every few tens of milliseconds.
     std::int64_t recordsSinceProgress_ = 0;

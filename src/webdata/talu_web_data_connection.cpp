@@ -16,7 +16,9 @@ namespace {
 constexpr int kTickMs = 20;
 } // namespace
 
-QDateTime CTALUWebData::Now() const { return CurrentClock().Now(); }
+QDateTime CTALUWebData::Now() const {
+    return CurrentClock().Now();
+}
 
 QDateTime CTALUWebData::NextDeadline() const {
     return Now().addMSecs(CurrentClock().Waits().replyGap.count());
@@ -28,8 +30,7 @@ void CTALUWebData::PumpOnce() {
 
 bool CTALUWebData::OpenConnection() {
     try {
-        if (!socket_)
-            throw WebDataError(QStringLiteral("Object variable not set"));
+        if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
         // A close the service sent after its last reply must be seen before the
         // connection is trusted again.
         QCoreApplication::processEvents();
@@ -46,10 +47,8 @@ bool CTALUWebData::OpenConnection() {
             tick.start(kTickMs);
             while (socket_ && socket_->State() != kSocketConnected) {
                 PumpOnce();
-                if (socket_ && socket_->State() == kSocketError)
-                    return false;
-                if (userCancel_ || Now() > giveUp)
-                    break;
+                if (socket_ && socket_->State() == kSocketError) return false;
+                if (userCancel_ || Now() > giveUp) break;
             }
             if (socket_)
                 TraceDebug(QStringLiteral("Connected Winsock State:") +
@@ -62,8 +61,7 @@ bool CTALUWebData::OpenConnection() {
         ShowStatusText(QStringLiteral("*Not* connected to ") + remoteHost_);
         return false;
     } catch (const WebDataError& e) {
-        if (socket_)
-            socket_->Close();
+        if (socket_) socket_->Close();
         ErrorReport(QStringLiteral("Connect"), e.Description());
         return false;
     }
@@ -75,11 +73,9 @@ bool CTALUWebData::WaitForReply() {
     QTimer tick;
     tick.start(kTickMs);
     for (;;) {
-        if (replyStatus_ != 0)
-            break;
+        if (replyStatus_ != 0) break;
         PumpOnce();
-        if (Now() > deadline_ || userCancel_)
-            break;
+        if (Now() > deadline_ || userCancel_) break;
     }
     replyKind_ = kNothing;
     if (replyStatus_ == 0) {
@@ -92,14 +88,15 @@ bool CTALUWebData::WaitForReply() {
 }
 
 void CTALUWebData::DropConnection() {
-    if (socket_)
-        socket_->Close();
+    if (socket_) socket_->Close();
     stream_.Clear();
     chunkedBody_ = false;
     closeAfterReply_ = false;
 }
 
-void CTALUWebData::Connect(int /*index*/) { TraceDebug(QStringLiteral("Connect")); }
+void CTALUWebData::Connect(int /*index*/) {
+    TraceDebug(QStringLiteral("Connect"));
+}
 
 void CTALUWebData::ConnectionRequest(int index, std::int32_t requestId) {
     TraceDebug(QStringLiteral("ConnectionRequest: ") + QString::number(requestId) +
@@ -115,8 +112,7 @@ void CTALUWebData::Disconnect() {
     stream_.Clear();
     chunkedBody_ = false;
     closeAfterReply_ = false;
-    if (socket_)
-        socket_->Close();
+    if (socket_) socket_->Close();
 }
 
 void CTALUWebData::WError(int /*index*/, int /*number*/, const QString& description) {
@@ -125,7 +121,9 @@ void CTALUWebData::WError(int /*index*/, int /*number*/, const QString& descript
     Q_EMIT ShowStatus(description);
 }
 
-void CTALUWebData::SendComplete(int /*index*/) { TraceSent(QStringLiteral("Send complete")); }
+void CTALUWebData::SendComplete(int /*index*/) {
+    TraceSent(QStringLiteral("Send complete"));
+}
 
 void CTALUWebData::SendProgress(int /*index*/, std::int64_t bytesSent,
                                 std::int64_t bytesRemaining) {
@@ -134,11 +132,9 @@ void CTALUWebData::SendProgress(int /*index*/, std::int64_t bytesSent,
 }
 
 void CTALUWebData::DataArrival(int /*index*/, std::int64_t bytes) {
-    if (bytes <= 0)
-        return;
+    if (bytes <= 0) return;
     try {
-        if (!socket_)
-            throw WebDataError(QStringLiteral("Object variable not set"));
+        if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
         const QByteArray data = socket_->GetData();
         deadline_ = NextDeadline();
         stream_.Append(data);

@@ -18,7 +18,9 @@ constexpr qint64 kProgressIntervalMs = 50;
 // Lines between two looks at the progress clock.
 constexpr std::int64_t kProgressStride = 64;
 
-QString Text(QByteArrayView bytes) { return QString::fromUtf8(bytes); }
+QString Text(QByteArrayView bytes) {
+    return QString::fromUtf8(bytes);
+}
 
 QString TrimSpaces(const QString& text) {
     qsizetype start = 0;
@@ -41,8 +43,7 @@ ReplyStream::Next CTALUWebData::OnLine(QByteArrayView line) {
     const int stateBefore = httpState_;
     replyEnded_ = false;
     ProcessReply(line);
-    if (stateBefore == 1 && httpState_ == 2 && chunkedBody_)
-        return ReplyStream::Next::ChunkedBody;
+    if (stateBefore == 1 && httpState_ == 2 && chunkedBody_) return ReplyStream::Next::ChunkedBody;
     if (replyEnded_ && closeAfterReply_) {
         dropAfterDrain_ = true;
         return ReplyStream::Next::Stop;
@@ -52,10 +53,8 @@ ReplyStream::Next CTALUWebData::OnLine(QByteArrayView line) {
 
 void CTALUWebData::ProcessReply(QByteArrayView line) {
     try {
-        if (Logging(2))
-            TraceReceived(Text(line));
-        if (!ProcessBrowserReplies(line))
-            return;
+        if (Logging(2)) TraceReceived(Text(line));
+        if (!ProcessBrowserReplies(line)) return;
         if (Logging(3))
             TraceDebug(QStringLiteral("Processing>") + Text(line) + QStringLiteral("<"));
         const bool ok = line.startsWith("OK");
@@ -72,7 +71,7 @@ void CTALUWebData::ProcessReply(QByteArrayView line) {
             break;
         case kLastDate:
             if (ok) {
-                ProcessLastDate(TrimSpaces(Text(line.mid(2))));
+                ProcessLastDate(TrimSpaces(Text(line.sliced(2))));
                 lastCommand_.clear();
                 replyKind_ = kNothing;
             }
@@ -84,8 +83,7 @@ void CTALUWebData::ProcessReply(QByteArrayView line) {
         default:
             break;
         }
-        if (!final)
-            return;
+        if (!final) return;
         replyStatus_ = ok ? 1 : 2;
         lastError_ = message;
         Q_EMIT Finished(message);
@@ -101,8 +99,7 @@ void CTALUWebData::ProcessReply(QByteArrayView line) {
 }
 
 bool CTALUWebData::ProcessBrowserReplies(QByteArrayView line) {
-    if (StartsWithPhp(line))
-        return false;
+    if (StartsWithPhp(line)) return false;
     switch (httpState_) {
     case 0:
         ProcessStatusLine(Text(line));
@@ -111,8 +108,7 @@ bool CTALUWebData::ProcessBrowserReplies(QByteArrayView line) {
         ProcessHeaderLine(line);
         return false;
     case 2:
-        if (!line.isEmpty())
-            return true;
+        if (!line.isEmpty()) return true;
         TraceDebug(QStringLiteral("HTTP receiving data, but empty line received"));
         return false;
     default:
@@ -159,14 +155,12 @@ void CTALUWebData::ProcessHeaderLine(QByteArrayView line) {
         TraceDebug(QStringLiteral("Blank line - rest must be data HTTPState:2 |"));
         return;
     }
-    if (Logging(3))
-        TraceDebug(QStringLiteral("Must be HTTP header line:1 |") + Text(line));
+    if (Logging(3)) TraceDebug(QStringLiteral("Must be HTTP header line:1 |") + Text(line));
     // Only the framing of the body and the fate of the connection matter here.
     const qsizetype colon = line.indexOf(':');
-    if (colon < 0)
-        return;
+    if (colon < 0) return;
     const QByteArray name = line.first(colon).trimmed().toByteArray().toLower();
-    const QByteArray value = line.mid(colon + 1).trimmed().toByteArray().toLower();
+    const QByteArray value = line.sliced(colon + 1).trimmed().toByteArray().toLower();
     if (name == "transfer-encoding")
         chunkedBody_ = value.contains("chunked");
     else if (name == "connection" && value.contains("close"))
@@ -193,12 +187,10 @@ void CTALUWebData::ProcessDataLine(QByteArrayView line, bool final, bool ok, QSt
         message = QStringLiteral("No new data");
         ShowStatusText(message);
     }
-    if (!ok)
-        WriteLogFile(lastCommand_ + QStringLiteral(">") + Text(line));
+    if (!ok) WriteLogFile(lastCommand_ + QStringLiteral(">") + Text(line));
     lastCommand_.clear();
     replyKind_ = kNothing;
-    if (progress_)
-        progress_->Finish();
+    if (progress_) progress_->Finish();
 }
 
 void CTALUWebData::WriteDataLine(QByteArrayView line) {
@@ -220,26 +212,21 @@ void CTALUWebData::WriteDataLine(QByteArrayView line) {
 }
 
 void CTALUWebData::ShowRecordProgress(QByteArrayView line) {
-    if (!progress_ || !(serverLastDate_ > localLastDate_))
-        return;
-    if (recordsSinceProgress_++ % kProgressStride != 0)
-        return;
+    if (!progress_ || !(serverLastDate_ > localLastDate_)) return;
+    if (recordsSinceProgress_++ % kProgressStride != 0) return;
     const qint64 now = progressClock_.elapsed();
-    if (lastProgressMs_ >= 0 && now - lastProgressMs_ < kProgressIntervalMs)
-        return;
+    if (lastProgressMs_ >= 0 && now - lastProgressMs_ < kProgressIntervalMs) return;
     lastProgressMs_ = now;
     // The date only moves the bar: a line whose date cannot be read counts as
     // 0 and is still saved, without stopping the download for a question.
     DateValue date = 0;
     try {
         const LineDate read = DateOfLine(Text(line), dateFormat_);
-        if (read.hasDate)
-            date = read.value;
+        if (read.hasDate) date = read.value;
     } catch (const WebDataError&) {
         date = 0;
     }
-    const double percent =
-        (date - localLastDate_) * 100.0 / (serverLastDate_ - localLastDate_);
+    const double percent = (date - localLastDate_) * 100.0 / (serverLastDate_ - localLastDate_);
     const double shown = std::clamp(RoundHalfEven(percent), 0.0, 100.0);
     progress_->Show(static_cast<std::int64_t>(shown), FormatDateLong(date));
 }
@@ -263,8 +250,8 @@ void CTALUWebData::ProcessUserFolders(QByteArrayView line) {
     userFurtherFolder_ = items.at(2);
     userDataFolder_ = items.at(3);
     userName_ = items.at(4);
-    TraceDebug(QStringLiteral("UserFolder: ") + userFolder_ + QStringLiteral(" UserCurrentFolder: ") +
-               userCurrentFolder_);
+    TraceDebug(QStringLiteral("UserFolder: ") + userFolder_ +
+               QStringLiteral(" UserCurrentFolder: ") + userCurrentFolder_);
 }
 
 void CTALUWebData::EndReplyWithError(const QString& message) {

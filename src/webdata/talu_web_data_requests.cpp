@@ -16,30 +16,27 @@ namespace {
 enum Action { kActionLastDate = 3, kActionData = 5, kActionUserFolders = 12 };
 }
 
-bool CTALUWebData::Initialise() { return DoCommand(kActionUserFolders); }
+bool CTALUWebData::Initialise() {
+    return DoCommand(kActionUserFolders);
+}
 
 bool CTALUWebData::GetNewData(const QString& localFilename, int location, int dateType) {
     localFile_ = localFilename;
     dateFormat_ = dateType;
     remoteFile_ = GetFileName(localFilename);
     fileLocation_ = location;
-    if (progress_)
-        progress_->Initialise(-1, 0, QStringLiteral("Records"));
-    if (!DoCommand(kActionLastDate))
-        return false;
-    if (doFromDate_ && fromDate_ > serverLastDate_)
-        serverLastDate_ = fromDate_;
+    if (progress_) progress_->Initialise(-1, 0, QStringLiteral("Records"));
+    if (!DoCommand(kActionLastDate)) return false;
+    if (doFromDate_ && fromDate_ > serverLastDate_) serverLastDate_ = fromDate_;
     return DoCommand(kActionData);
 }
 
-QString CTALUWebData::LastDateInFile(const QString& file, int locationId, int which,
-                                     int dateFormat, int display) {
+QString CTALUWebData::LastDateInFile(const QString& file, int locationId, int which, int dateFormat,
+                                     int display) {
     BusyGuard busy(CurrentBusyPointer());
     dateFormat_ = dateFormat;
-    if (dateFormat == 0 || display == 0)
-        return QStringLiteral("-");
-    if (which == 0)
-        return FormatDateLong(GetLastDateInFile(file));
+    if (dateFormat == 0 || display == 0) return QStringLiteral("-");
+    if (which == 0) return FormatDateLong(GetLastDateInFile(file));
     if (which == 1) {
         remoteFile_ = file.mid(file.lastIndexOf(QLatin1Char('/')) + 1);
         fileLocation_ = locationId;
@@ -112,8 +109,7 @@ void CTALUWebData::SendCommand(int commandIndex, const QString& dateText) {
 
 void CTALUWebData::SendReply(const QString& line) {
     try {
-        if (!socket_)
-            throw WebDataError(QStringLiteral("Object variable not set"));
+        if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
         if (!socket_->SendData(line.toUtf8() + "\r\n"))
             throw WebDataError(QStringLiteral("Wrong protocol or connection state for the "
                                               "requested transaction or request"));
@@ -156,7 +152,8 @@ DateValue CTALUWebData::GetLastDateInFile(const QString& file) {
         if (!last->line.isEmpty() && GetDateFromLine(QString::fromUtf8(last->line), date))
             result = date;
     } else {
-        TraceDebug(QStringLiteral("File: ") + file + QStringLiteral(" does not exists, so return 0"));
+        TraceDebug(QStringLiteral("File: ") + file +
+                   QStringLiteral(" does not exists, so return 0"));
     }
     localLastDate_ = result;
     TraceDebug(QStringLiteral("Last date in file: ") + file + QStringLiteral(" date: ") +

@@ -24,10 +24,8 @@ TcpSocketControl::~TcpSocketControl() {
 }
 
 int TcpSocketControl::State() const {
-    if (failed_)
-        return kSocketError;
-    if (peerClosed_)
-        return kSocketPeerClosing;
+    if (failed_) return kSocketError;
+    if (peerClosed_) return kSocketPeerClosing;
     switch (socket_.state()) {
     case QAbstractSocket::UnconnectedState:
         return kSocketClosed;
@@ -62,24 +60,25 @@ void TcpSocketControl::Connect() {
 }
 
 bool TcpSocketControl::SendData(const QByteArray& bytes) {
-    if (socket_.state() != QAbstractSocket::ConnectedState)
-        return false;
+    if (socket_.state() != QAbstractSocket::ConnectedState) return false;
     return socket_.write(bytes) == bytes.size();
 }
 
-QByteArray TcpSocketControl::GetData() { return socket_.readAll(); }
+QByteArray TcpSocketControl::GetData() {
+    return socket_.readAll();
+}
 
-void TcpSocketControl::OnConnected() { Q_EMIT Connected(index_); }
+void TcpSocketControl::OnConnected() {
+    Q_EMIT Connected(index_);
+}
 
 void TcpSocketControl::OnReadyRead() {
     const qint64 waiting = socket_.bytesAvailable();
-    if (waiting > 0)
-        Q_EMIT DataArrived(index_, waiting);
+    if (waiting > 0) Q_EMIT DataArrived(index_, waiting);
 }
 
 void TcpSocketControl::OnDisconnected() {
-    if (closing_)
-        return;
+    if (closing_) return;
     peerClosed_ = true;
     // Bytes that came with the close are handed over before the close itself.
     OnReadyRead();
@@ -88,8 +87,7 @@ void TcpSocketControl::OnDisconnected() {
 
 void TcpSocketControl::OnError(QAbstractSocket::SocketError error) {
     // A peer closing is an ordinary close, not a failure.
-    if (error == QAbstractSocket::RemoteHostClosedError || closing_)
-        return;
+    if (error == QAbstractSocket::RemoteHostClosedError || closing_) return;
     failed_ = true;
     Q_EMIT ErrorOccurred(index_, static_cast<int>(error), socket_.errorString());
 }
@@ -97,8 +95,7 @@ void TcpSocketControl::OnError(QAbstractSocket::SocketError error) {
 void TcpSocketControl::OnBytesWritten(qint64 bytes) {
     const qint64 remaining = socket_.bytesToWrite();
     Q_EMIT SendProgressed(index_, bytes, remaining);
-    if (remaining == 0)
-        Q_EMIT SendCompleted(index_);
+    if (remaining == 0) Q_EMIT SendCompleted(index_);
 }
 
 } // namespace quorvel
