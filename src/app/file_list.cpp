@@ -129,4 +129,14 @@ std::optional<AppError> FileList::LoadLocalDates(const QString& applicationFolde
     return std::nullopt;
 }
 
+int AddNewFileRecord(FileList& list, const LocationFolders& folders, const QString& path,
+                     int before) {
+    const AnalysedFilename found = AnalyseFilename(folders, path);
+    const int index = before < 0 || before > list.Count() ? list.Count() : before;
+    const auto location = static_cast<std::int16_t>(found.locationId);
+    if (!list.Insert(index, NewFileRecord(found.name, location, found.folder))) return -1;
+    list.ListChanged = true;
+    return index;
+}
+
 } // namespace quorvel

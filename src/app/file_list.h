@@ -73,4 +73,10 @@ private:
     std::vector<FileRecord> records_;
 };
 
+// Inserts the record for a file the user picked or dropped before entry before
+// (at the end when before is -1 or beyond the end) and sets ListChanged. Returns
+// the new entry's index, or -1 when the list is full.
+int AddNewFileRecord(FileList& list, const LocationFolders& folders, const QString& path,
+                     int before);
+
 } // namespace quorvel

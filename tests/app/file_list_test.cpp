@@ -256,5 +256,29 @@ TEST(FileListSave, ALongListRoundTrips) {
     EXPECT_EQ(list.At(4321), testing::SampleRecord(4321));
 }
 
+TEST(FileListEdit, NewFilesChosenTogetherStandInReverseBeforeTheSelectedEntry) {
+    LocationFolders folders;
+    folders.application = "/opt/quorvel";
+    folders.data = "/data";
+    folders.user = "Farm1";
+    FileList list;
+    list.Append(FullRecord(1, "kept"));
+    int selected = 0;
+    for (const char* path : {"/data/A.csv", "/opt/quorvel/B.csv", "/elsewhere/C.csv"}) {
+        selected = AddNewFileRecord(list, folders, path, selected);
+    }
+    ASSERT_EQ(list.Count(), 4);
+    EXPECT_TRUE(list.ListChanged);
+    EXPECT_EQ(list.At(0).Name, "C.csv");
+    EXPECT_EQ(list.At(0).UserLocationID, kLocationOther);
+    EXPECT_EQ(list.At(0).Folder, "/elsewhere");
+    EXPECT_EQ(list.At(1).FileName, "B.csv");
+    EXPECT_EQ(list.At(1).AdminLocationID, kLocationApplication);
+    EXPECT_EQ(list.At(2).UserLocationID, kLocationData);
+    EXPECT_TRUE(list.At(2).Folder.isEmpty());
+    EXPECT_EQ(list.At(3).Name, "kept");
+    EXPECT_EQ(AddNewFileRecord(list, folders, "/data/D.csv", -1), 4);
+}
+
 } // namespace
 } // namespace quorvel
