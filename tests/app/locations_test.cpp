@@ -72,30 +72,25 @@ TEST(ProcessFilename, NamesAndRelativeFoldersThatClimbOutAreRefused) {
     EXPECT_EQ(PathOf(f, "a.csv", kLocationOther, kOnThisPc), "/var/../srv/a.csv");
 }
 
-TEST(AnalyseFilename, TheMostSpecificFolderWins) {
-    EXPECT_EQ(AnalyseFilename(kFarm, "/data/a.csv").locationId, kLocationData);
-    EXPECT_EQ(AnalyseFilename(kFarm, "/DATA/farm1/a.csv").locationId, kLocationUser);
-    EXPECT_EQ(AnalyseFilename(kFarm, "/data/Farm1/2024/a.csv").locationId, kLocationUserCurrent);
-    EXPECT_EQ(AnalyseFilename(kFarm, "/opt/q/a.csv").locationId, kLocationApplication);
+TEST(AnalyseFilename, TheMostSpecificFolderWinsAndOtherFoldersAreKept) {
+    const QStringList paths{"/opt/q/a.csv", "/data/a.csv", "/DATA/farm1/a.csv",
+                            "/data/Farm1/2024/a.csv", "/home/me/a.csv"};
+    for (int id = 0; id < 5; ++id)
+        EXPECT_EQ(AnalyseFilename(kFarm, paths[id]).locationId, id);
+    const AnalysedFilename other = AnalyseFilename(kFarm, "/home/me/b.csv");
+    EXPECT_TRUE(other.folder == "/home/me" && other.name == "b.csv");
+    EXPECT_TRUE(AnalyseFilename(kFarm, "/data/b.csv").folder.isEmpty());
+    const AnalysedFilename bare = AnalyseFilename(kFarm, "b.csv");
+    EXPECT_TRUE(bare.locationId == kLocationOther && bare.folder.isEmpty());
+
     LocationFolders f = kFarm;
     f.application = "/data";
     EXPECT_EQ(AnalyseFilename(f, "/data/a.csv").locationId, kLocationData);
-    f.user.clear();
-    f.userCurrent.clear();
+    f.user = f.userCurrent = QString();
     EXPECT_EQ(AnalyseFilename(f, "/data/a.csv").locationId, kLocationUserCurrent);
     f.application = "/opt/q";
-    f.data = "/data/";
+    f.data = "/data/"; // a folder text ending in a separator never matches
     EXPECT_EQ(AnalyseFilename(f, "/data/a.csv").locationId, kLocationOther);
-}
-
-TEST(AnalyseFilename, AnUnrelatedFolderIsOther) {
-    const AnalysedFilename a = AnalyseFilename(kFarm, "/home/me/b.csv");
-    EXPECT_EQ(a.locationId, kLocationOther);
-    EXPECT_EQ(a.folder, "/home/me");
-    EXPECT_EQ(a.name, "b.csv");
-    const AnalysedFilename bare = AnalyseFilename(kFarm, "b.csv");
-    EXPECT_EQ(bare.locationId, kLocationOther);
-    EXPECT_TRUE(bare.folder.isEmpty());
 }
 
 TEST(FolderChecks, MissingFoldersAreMadeAndAFailureStopsTheCheck) {
