@@ -7,6 +7,14 @@
 namespace quorvel {
 namespace {
 
+TEST(ListLineFormat, ATildeOrLineBreakInATextCannotShiftTheFields) {
+    FileRecord r = NewFileRecord("a~b.csv", kLocationData, {});
+    r.Name = "North~\r\nSouth";
+    const ParsedRecordLine back = ParseFileRecordLine(FormatFileRecordLine(r));
+    EXPECT_TRUE(back.record.Name == "North-  South" && back.record.FileName == "a-b.csv");
+    EXPECT_TRUE(back.record.UserLocationID == kLocationData && back.record.Download == 1);
+}
+
 TEST(ListLineFormat, LinesThatAreNoRecordsAreSkipped) {
     for (const char* line :
          {"# my files", "~~~~~", "ID~1~a~b~0~0~0", "12abc~1~a~b~0~0", "", "1~1~a~b~0"}) {
