@@ -87,6 +87,13 @@ std::optional<AppError> FileList::SaveFileList(const LocationFolders& folders) {
     return std::nullopt;
 }
 
+std::optional<AppError> FileList::SaveFileListAs(const QString& path,
+                                                 const LocationFolders& folders) {
+    LoadedFile = path;
+    ListChanged = true;
+    return SaveFileList(folders);
+}
+
 std::optional<AppError> FileList::WriteTo(const QString& path,
                                           const std::function<bool(int)>& keepGoing) const {
     const QString where = QStringLiteral("SaveFileList:") + path;

@@ -112,9 +112,10 @@ TEST(FileListSave, WritesOnlyChangedListsAndWaitsForUsableFolders) {
     EXPECT_FALSE(list.ListChanged);
     EXPECT_TRUE(home.Read("files.txt").contains("~edited~"));
 
-    list.LoadedFile = home.File("no/such/files.txt");
-    list.ListChanged = true;
-    const auto error = list.SaveFileList(folders);
+    // Saved under a new name, an unchanged list is written too.
+    EXPECT_FALSE(list.SaveFileListAs(home.File("copy.txt"), folders).has_value());
+    EXPECT_EQ(home.Read("copy.txt"), home.Read("files.txt"));
+    const auto error = list.SaveFileListAs(home.File("no/such/files.txt"), folders);
     ASSERT_TRUE(error.has_value());
     EXPECT_EQ(error->where, "SaveFileList:" + list.LoadedFile);
     EXPECT_TRUE(list.ListChanged);
