@@ -15,13 +15,6 @@ TEST(ListLineFormat, ATildeOrLineBreakInATextCannotShiftTheFields) {
     EXPECT_TRUE(back.record.UserLocationID == kLocationData && back.record.Download == 1);
 }
 
-TEST(ListLineFormat, LinesThatAreNoRecordsAreSkipped) {
-    for (const char* line :
-         {"# my files", "~~~~~", "ID~1~a~b~0~0~0", "12abc~1~a~b~0~0", "", "1~1~a~b~0"}) {
-        EXPECT_EQ(ParseFileRecordLine(line).kind, ParsedRecordLine::kNotRecord) << line;
-    }
-}
-
 TEST(ListLineFormat, ShortLinesBlanksAndFractionsAreRead) {
     const ParsedRecordLine six = ParseFileRecordLine("  77  ~1~ Rain ~rain.csv~2~1");
     ASSERT_EQ(six.kind, ParsedRecordLine::kRecord);

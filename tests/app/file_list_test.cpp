@@ -24,6 +24,7 @@ TEST(FileListLoad, SkipsCommentAndBadLinesAndKeepsOrder) {
                                 " 1 ~1~First~a.csv~0~0~0~0~0~1~0~~~0\r\n"
                                 "~~~~~\r\n"
                                 "ID~Active~Name~File~Type~Admin\r\n"
+                                "12abc~1~a~b~0~0\r\n1~1~five~fields~0\r\n\r\n"
                                 " 2 ~0~Second~b.csv~1~1~1~1~0~3~0~~2 Jan 2024~9\n");
     FileList list;
     list.Append(testing::SampleRecord(9));
