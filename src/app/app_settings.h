@@ -39,6 +39,8 @@ struct AppSettings {
     float top = 0;              // "Top"
     std::int16_t showDate1 = 0; // "ShowDate1"
 
+    bool operator==(const AppSettings&) const = default;
+
     // The values of a first start without a settings file.
     static AppSettings Defaults(const QString& programFolder, int currentYear);
 

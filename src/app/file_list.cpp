@@ -87,6 +87,13 @@ std::optional<AppError> FileList::SaveFileList(const LocationFolders& folders) {
     return std::nullopt;
 }
 
+std::optional<AppError> FileList::SaveFileListAs(const QString& path,
+                                                 const LocationFolders& folders) {
+    LoadedFile = path;
+    ListChanged = true;
+    return SaveFileList(folders);
+}
+
 std::optional<AppError> FileList::WriteTo(const QString& path,
                                           const std::function<bool(int)>& keepGoing) const {
     const QString where = QStringLiteral("SaveFileList:") + path;
@@ -127,6 +134,16 @@ std::optional<AppError> FileList::LoadLocalDates(const QString& applicationFolde
         }
     }
     return std::nullopt;
+}
+
+int AddNewFileRecord(FileList& list, const LocationFolders& folders, const QString& path,
+                     int before) {
+    const AnalysedFilename found = AnalyseFilename(folders, path);
+    const int index = before < 0 || before > list.Count() ? list.Count() : before;
+    const auto location = static_cast<std::int16_t>(found.locationId);
+    if (!list.Insert(index, NewFileRecord(found.name, location, found.folder))) return -1;
+    list.ListChanged = true;
+    return index;
 }
 
 } // namespace quorvel

@@ -55,6 +55,11 @@ public:
     // list waits for a later save. Clears ListChanged after writing.
     std::optional<AppError> SaveFileList(const LocationFolders& folders);
 
+    // The File menu's "Save...": the list is written under the chosen name even
+    // when it has not changed (it could not be found there otherwise) and the
+    // name becomes LoadedFile.
+    std::optional<AppError> SaveFileListAs(const QString& path, const LocationFolders& folders);
+
     // Writes the records to path through a temporary file that replaces the old
     // one only when complete. keepGoing, when given, is asked after every line
     // and may stop the save part-way; the old file then stays as it was.
@@ -72,5 +77,11 @@ public:
 private:
     std::vector<FileRecord> records_;
 };
+
+// Inserts the record for a file the user picked or dropped before entry before
+// (at the end when before is -1 or beyond the end) and sets ListChanged. Returns
+// the new entry's index, or -1 when the list is full.
+int AddNewFileRecord(FileList& list, const LocationFolders& folders, const QString& path,
+                     int before);
 
 } // namespace quorvel

@@ -88,6 +88,18 @@ void SetNumber(FileRecord& record, int field, std::int16_t value) {
     }
 }
 
+// A "~" or a line break inside a text would split the record when it is read
+// again and shift every later field; they are written as "-" and a blank.
+QString FieldText(QString text) {
+    for (QChar& c : text) {
+        if (c == kListFieldSeparator)
+            c = u'-';
+        else if (c == u'\r' || c == u'\n')
+            c = u' ';
+    }
+    return text;
+}
+
 } // namespace
 
 QString FormatListNumber(std::int32_t value) {
@@ -99,8 +111,8 @@ QString FormatFileRecordLine(const FileRecord& r) {
     const QStringList fields{
         FormatListNumber(r.FileID),
         QString::number(r.Active),
-        r.Name,
-        r.FileName,
+        FieldText(r.Name),
+        FieldText(r.FileName),
         QString::number(r.TypeID),
         QString::number(r.AdminLocationID),
         QString::number(r.UserLocationID),
@@ -108,8 +120,8 @@ QString FormatFileRecordLine(const FileRecord& r) {
         QString::number(r.Zip),
         QString::number(r.Download),
         QString::number(r.Upload),
-        r.Folder,
-        r.FileDate,
+        FieldText(r.Folder),
+        FieldText(r.FileDate),
         QString::number(r.SpareNumber),
     };
     return fields.join(kListFieldSeparator);

@@ -23,7 +23,8 @@ inline constexpr int kListMinimumFields = 6;
 // one trailing blank: " 12 ", "-5 ".
 QString FormatListNumber(std::int32_t value);
 
-// One record as a line, without the line end. FileDateLocal is not written.
+// One record as a line, without the line end. FileDateLocal is not written; a
+// "~" or line break inside a text is written as "-" or a blank.
 QString FormatFileRecordLine(const FileRecord& record);
 
 // True when the whole text (blanks around it allowed) is a decimal number.

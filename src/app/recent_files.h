@@ -29,6 +29,8 @@ public:
         return IsEntryVisible(1, fileListFromUser);
     }
 
+    bool operator==(const RecentFiles&) const = default;
+
 private:
     std::array<QString, kEntries> entries_;
 };

@@ -1,7 +1,6 @@
 // The file list against real files: loading, saving, local dates.
 
 #include "app/file_list.h"
-#include "app/file_list_format.h"
 #include "common/recorders.h"
 #include "common/temp_home.h"
 #include "sample_list.h"
@@ -16,32 +15,7 @@ namespace {
 
 using testing::TempHome;
 
-FileRecord FullRecord(int id, const QString& name) {
-    FileRecord r;
-    r.FileID = id;
-    r.Active = 1;
-    r.Name = name;
-    r.FileName = "sub\\" + name + ".csv";
-    r.TypeID = 3;
-    r.AdminLocationID = 2;
-    r.UserLocationID = 4;
-    r.MethodID = 1;
-    r.Zip = 0;
-    r.Download = 3;
-    r.Upload = 2;
-    r.Folder = "Logs";
-    r.FileDate = "3 Mar 2024 10:00:00";
-    r.FileDateLocal = "1 Mar 2024";
-    r.SpareNumber = -17;
-    return r;
-}
-
-LocationFolders FoldersIn(const TempHome& home) {
-    LocationFolders folders;
-    folders.application = home.Path();
-    folders.data = home.File("data");
-    return folders;
-}
+const QByteArray kOldList = " 1 ~1~keep~keep.csv~0~0~0~0~0~1~0~~~0\r\n";
 
 TEST(FileListLoad, SkipsCommentAndBadLinesAndKeepsOrder) {
     TempHome home;
@@ -50,59 +24,39 @@ TEST(FileListLoad, SkipsCommentAndBadLinesAndKeepsOrder) {
                                 " 1 ~1~First~a.csv~0~0~0~0~0~1~0~~~0\r\n"
                                 "~~~~~\r\n"
                                 "ID~Active~Name~File~Type~Admin\r\n"
-                                " 2 ~0~Second~b.csv~1~1~1~1~0~3~0~~2 Jan 2024~9\r\n");
+                                "12abc~1~a~b~0~0\r\n1~1~five~fields~0\r\n\r\n"
+                                " 2 ~0~Second~b.csv~1~1~1~1~0~3~0~~2 Jan 2024~9\n");
     FileList list;
+    list.Append(testing::SampleRecord(9));
     const ListLoadResult result = list.LoadDataFile(path);
-    EXPECT_TRUE(result.ok);
-    EXPECT_TRUE(result.errors.empty());
+    EXPECT_TRUE(result.ok && result.errors.empty());
     ASSERT_EQ(list.Count(), 2);
     EXPECT_EQ(list.At(0).Name, "First");
-    EXPECT_EQ(list.At(1).Name, "Second");
     EXPECT_EQ(list.At(1).FileDate, "2 Jan 2024");
-    EXPECT_EQ(list.At(1).SpareNumber, 9);
     EXPECT_EQ(list.LoadedFile, path);
 }
 
-TEST(FileListLoad, ReplacesTheRecordsOfAnEarlierList) {
+TEST(FileListLoad, MissingFileIsAnEmptyListAndAFolderIsAFailure) {
     TempHome home;
     FileList list;
-    list.Append(FullRecord(1, "old"));
-    list.LoadDataFile(home.Write("files.txt", " 5 ~1~New~n.csv~0~0\r\n"));
-    ASSERT_EQ(list.Count(), 1);
-    EXPECT_EQ(list.At(0).FileID, 5);
-}
-
-TEST(FileListLoad, MissingFileGivesAnEmptyListThatWillBeSavedThere) {
-    TempHome home;
-    FileList list;
-    list.Append(FullRecord(1, "old"));
-    const QString path = home.File("nothing.txt");
-    const ListLoadResult result = list.LoadDataFile(path);
-    EXPECT_TRUE(result.ok);
+    list.Append(testing::SampleRecord(1));
+    EXPECT_TRUE(list.LoadDataFile(home.File("none.txt")).ok);
     EXPECT_TRUE(list.IsEmpty());
-    EXPECT_EQ(list.LoadedFile, path);
-}
+    EXPECT_EQ(list.LoadedFile, home.File("none.txt"));
 
-TEST(FileListLoad, UnreadableFileFails) {
-    TempHome home;
-    // A folder of that name exists but cannot be read as a list.
-    const QString path = home.File("files.txt");
-    ASSERT_TRUE(QDir().mkpath(path));
-    FileList list;
-    const ListLoadResult result = list.LoadDataFile(path);
+    ASSERT_TRUE(QDir().mkpath(home.File("dir.txt")));
+    const ListLoadResult result = list.LoadDataFile(home.File("dir.txt"));
     EXPECT_FALSE(result.ok);
     ASSERT_EQ(result.errors.size(), 1u);
-    EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + path);
-    EXPECT_TRUE(list.IsEmpty());
+    EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + home.File("dir.txt"));
 }
 
 TEST(FileListLoad, OverflowIsReportedWithTheLineAndLoadingGoesOn) {
     TempHome home;
     const QString bad = "40000~1~Big~big.csv~0~0~0~0~0~1~0~~~0";
-    const QString path = home.Write(
-        "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + bad + "\r\n 3 ~1~c~c.csv~0~0\r\n").toUtf8());
     FileList list;
-    const ListLoadResult result = list.LoadDataFile(path);
+    const ListLoadResult result = list.LoadDataFile(home.Write(
+        "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + bad + "\r\n 3 ~1~c~c.csv~0~0").toUtf8()));
     EXPECT_TRUE(result.ok);
     ASSERT_EQ(result.errors.size(), 1u);
     EXPECT_EQ(result.errors[0], (AppError{"Overflow", "LoadFilesRecord: " + bad}));
@@ -113,112 +67,75 @@ TEST(FileListLoad, OverflowIsReportedWithTheLineAndLoadingGoesOn) {
 
 TEST(FileListSave, SaveAndReloadGiveEveryFieldButTheLocalDate) {
     TempHome home;
-    FileList list;
-    list.Append(FullRecord(7, "one"));
-    list.Append(FullRecord(-3, "two"));
-    list.Append(NewFileRecord("rain.csv", kLocationOther, "/srv/logs"));
-    const QString path = home.File("files.txt");
-    ASSERT_FALSE(list.WriteTo(path).has_value());
-
-    FileList again;
-    ASSERT_TRUE(again.LoadDataFile(path).ok);
-    ASSERT_EQ(again.Count(), list.Count());
-    for (int i = 0; i < list.Count(); ++i) {
-        FileRecord expected = list.At(i);
-        expected.FileDateLocal.clear();
-        EXPECT_EQ(again.At(i), expected) << "record " << i;
-    }
-}
-
-TEST(FileListSave, NewRecordIsWrittenByteForByte) {
-    TempHome home;
-    FileList list;
-    list.Append(NewFileRecord("rain.csv", kLocationApplication, {}));
+    FileList list = testing::SampleList(300);
+    list.At(5).FileID = -3;
+    list.At(7).FileDateLocal = "1 Mar 2024";
+    list.Insert(0, NewFileRecord("rain.csv", kLocationApplication, {}));
     ASSERT_FALSE(list.WriteTo(home.File("files.txt")).has_value());
-    EXPECT_EQ(home.Read("files.txt"), QByteArray(" 0 ~1~rain.csv~rain.csv~0~0~0~0~0~1~0~~~0\r\n"));
+    EXPECT_TRUE(
+        home.Read("files.txt").startsWith(" 0 ~1~rain.csv~rain.csv~0~0~0~0~0~1~0~~~0\r\n 1 ~"));
+    FileList again;
+    ASSERT_TRUE(again.LoadDataFile(home.File("files.txt")).ok);
+    list.At(8).FileDateLocal.clear();
+    EXPECT_EQ(again.Records(), list.Records());
 }
 
 TEST(FileListSave, InterruptedSaveLeavesTheOldListAndNoStrayFile) {
     TempHome home;
-    const QByteArray old = " 1 ~1~keep~keep.csv~0~0~0~0~0~1~0~~~0\r\n";
-    const QString path = home.Write("files.txt", old);
-    FileList list;
-    for (int i = 0; i < 5; ++i)
-        list.Append(FullRecord(i, QString("r%1").arg(i)));
-
-    const auto error = list.WriteTo(path, [](int written) { return written < 3; });
+    const QString path = home.Write("files.txt", kOldList);
+    const auto error =
+        testing::SampleList(5).WriteTo(path, [](int written) { return written < 3; });
     ASSERT_TRUE(error.has_value());
     EXPECT_EQ(error->where, "SaveFileList:" + path);
-    EXPECT_EQ(home.Read("files.txt"), old);
+    EXPECT_EQ(home.Read("files.txt"), kOldList);
     EXPECT_EQ(QDir(home.Path()).entryList(QDir::Files), QStringList{"files.txt"});
 }
 
-TEST(FileListSave, SaveIntoAMissingFolderFailsAndReportsThePath) {
+TEST(FileListSave, WritesOnlyChangedListsAndWaitsForUsableFolders) {
     TempHome home;
+    testing::RecordingPorts ports;
     FileList list;
-    list.Append(FullRecord(1, "a"));
-    list.LoadedFile = home.File("no/such/folder/files.txt");
+    ASSERT_TRUE(list.LoadDataFile(home.Write("files.txt", kOldList)).ok);
+    list.At(0).Name = "edited";
+    LocationFolders folders{home.Path(), home.File("data"), {}, {}, {}, {}};
+    EXPECT_FALSE(list.SaveFileList(folders).has_value());
+    EXPECT_EQ(home.Read("files.txt"), kOldList);
+
     list.ListChanged = true;
-    const auto error = list.SaveFileList(FoldersIn(home));
+    home.Write("blocker", "a file where a folder should be");
+    LocationFolders blocked = folders;
+    blocked.data = home.File("blocker/data");
+    EXPECT_FALSE(list.SaveFileList(blocked).has_value());
+    EXPECT_TRUE(list.ListChanged);
+    EXPECT_EQ(home.Read("files.txt"), kOldList);
+
+    EXPECT_FALSE(list.SaveFileList(folders).has_value());
+    EXPECT_FALSE(list.ListChanged);
+    EXPECT_TRUE(home.Read("files.txt").contains("~edited~"));
+
+    // Saved under a new name, an unchanged list is written too.
+    EXPECT_FALSE(list.SaveFileListAs(home.File("copy.txt"), folders).has_value());
+    EXPECT_EQ(home.Read("copy.txt"), home.Read("files.txt"));
+    const auto error = list.SaveFileListAs(home.File("no/such/files.txt"), folders);
     ASSERT_TRUE(error.has_value());
     EXPECT_EQ(error->where, "SaveFileList:" + list.LoadedFile);
     EXPECT_TRUE(list.ListChanged);
 }
 
-TEST(FileListSave, WritesOnlyWhenChanged) {
-    TempHome home;
-    const QByteArray old = " 1 ~1~keep~keep.csv~0~0~0~0~0~1~0~~~0\r\n";
+TEST(FileListEdit, NewFilesChosenTogetherStandInReverseBeforeTheSelectedEntry) {
+    const LocationFolders folders{"/opt/quorvel", "/data", "Farm1", {}, {}, {}};
     FileList list;
-    ASSERT_TRUE(list.LoadDataFile(home.Write("files.txt", old)).ok);
-    list.At(0).Name = "edited";
-    EXPECT_FALSE(list.SaveFileList(FoldersIn(home)).has_value());
-    EXPECT_EQ(home.Read("files.txt"), old);
-
-    list.ListChanged = true;
-    EXPECT_FALSE(list.SaveFileList(FoldersIn(home)).has_value());
-    EXPECT_FALSE(list.ListChanged);
-    EXPECT_TRUE(home.Read("files.txt").contains("~edited~"));
-}
-
-TEST(FileListSave, WaitsWhileTheDataFolderCannotBeMade) {
-    TempHome home;
-    home.Write("blocker", "a file where a folder should be");
-    FileList list;
-    list.Append(FullRecord(1, "a"));
-    list.LoadedFile = home.File("files.txt");
-    list.ListChanged = true;
-    LocationFolders folders = FoldersIn(home);
-    folders.data = home.File("blocker/data");
-    testing::RecordingPorts ports;
-    EXPECT_FALSE(list.SaveFileList(folders).has_value());
+    list.Append(testing::SampleRecord(1));
+    int selected = 0;
+    for (const char* path : {"/data/A.csv", "/opt/quorvel/B.csv", "/elsewhere/C.csv"}) {
+        selected = AddNewFileRecord(list, folders, path, selected);
+    }
+    ASSERT_EQ(list.Count(), 4);
     EXPECT_TRUE(list.ListChanged);
-    EXPECT_FALSE(QFile::exists(list.LoadedFile));
-    ASSERT_EQ(ports.prompter.shown.size(), 1u);
-    EXPECT_TRUE(ports.prompter.shown[0].message.contains(home.File("blocker")));
-}
-
-TEST(FileListEdit, MovesStayInsideTheListAndInsertHonoursTheCountLimit) {
-    FileList list;
-    list.Append(FullRecord(1, "a"));
-    list.Append(FullRecord(2, "b"));
-    EXPECT_FALSE(list.Move(0, -1));
-    EXPECT_FALSE(list.Move(1, 1));
-    EXPECT_TRUE(list.Move(1, -1));
-    EXPECT_EQ(list.At(0).Name, "b");
-    EXPECT_TRUE(list.Insert(1, FullRecord(3, "c")));
-    EXPECT_EQ(list.At(1).Name, "c");
-    EXPECT_FALSE(list.Insert(5, FullRecord(4, "d")));
-    list.Remove(0);
-    EXPECT_EQ(list.At(0).Name, "c");
-}
-
-TEST(FileListEdit, ALineBeyondTheLargestCountIsRefused) {
-    FileList list;
-    for (int i = 0; i < FileList::kMaxRecords; ++i)
-        list.Append(FileRecord{});
-    const auto error = list.LoadFilesRecord(" 1 ~1~a~b~0~0");
-    ASSERT_TRUE(error.has_value());
-    EXPECT_EQ(list.Count(), FileList::kMaxRecords);
+    EXPECT_EQ(list.At(0), NewFileRecord("C.csv", kLocationOther, "/elsewhere"));
+    EXPECT_EQ(list.At(1), NewFileRecord("B.csv", kLocationApplication, {}));
+    EXPECT_EQ(list.At(2), NewFileRecord("A.csv", kLocationData, {}));
+    EXPECT_EQ(list.At(3), testing::SampleRecord(1));
 }
 
 TEST(LocalDates, TheLastLineForAnIdentifierWins) {
@@ -227,33 +144,12 @@ TEST(LocalDates, TheLastLineForAnIdentifierWins) {
                             "comment\r\n"
                             " 9 ~1~z~z.csv~0~0~0~0~0~3~0~~9 Jan 2024~0\r\n"
                             " 4 ~1~a~a.csv~0~0~0~0~0~3~0~~5 Jan 2024~0\r\n");
-    FileList list;
-    list.Append(FullRecord(4, "a"));
-    list.Append(FullRecord(5, "b"));
-    list.At(1).FileDateLocal.clear();
+    FileList list = testing::SampleList(2);
+    list.At(0).FileID = 4;
+    list.At(1).FileID = 5;
     EXPECT_FALSE(list.LoadLocalDates(home.Path()).has_value());
     EXPECT_EQ(list.At(0).FileDateLocal, "5 Jan 2024");
     EXPECT_TRUE(list.At(1).FileDateLocal.isEmpty());
-}
-
-TEST(LocalDates, NoLocalListChangesNothing) {
-    TempHome home;
-    FileList list;
-    list.Append(FullRecord(4, "a"));
-    EXPECT_FALSE(list.LoadLocalDates(home.File("empty")).has_value());
-    EXPECT_EQ(list.At(0).FileDateLocal, "1 Mar 2024");
-}
-
-TEST(FileListSave, ALongListRoundTrips) {
-    TempHome home;
-    const QString path = home.File("big.txt");
-    ASSERT_FALSE(testing::WriteSampleList(path, 5000).has_value());
-    FileList list;
-    const ListLoadResult result = list.LoadDataFile(path);
-    EXPECT_TRUE(result.ok);
-    EXPECT_TRUE(result.errors.empty());
-    ASSERT_EQ(list.Count(), 5000);
-    EXPECT_EQ(list.At(4321), testing::SampleRecord(4321));
 }
 
 } // namespace
