@@ -3,16 +3,19 @@
 #include <QComboBox>
 #include <QListWidget>
 
+#include <algorithm>
+
 namespace quorvel {
 
 namespace {
 
-std::int32_t DataOf(const QVariant& data) { return data.isValid() ? data.toInt() : 0; }
+std::int32_t DataOf(const QVariant& data) {
+    return data.isValid() ? data.toInt() : 0;
+}
 
 int FindData(const QListWidget* list, std::int32_t value) {
     for (int row = 0; row < list->count(); ++row) {
-        if (DataOf(list->item(row)->data(Qt::UserRole)) == value)
-            return row;
+        if (DataOf(list->item(row)->data(Qt::UserRole)) == value) return row;
     }
     return -1;
 }
@@ -38,8 +41,7 @@ void ListAddItem(QComboBox* list, const QString& text, std::int32_t data) {
 void ListMoveItem(QListWidget* list, int direction) {
     const int row = list->currentRow();
     const int target = direction == 1 ? row - 1 : row + 1;
-    if (row < 0 || target < 0 || target >= list->count())
-        return;
+    if (row < 0 || target < 0 || target >= list->count()) return;
     QListWidgetItem* item = list->takeItem(row);
     list->insertItem(target, item);
     list->setCurrentRow(target);
@@ -47,8 +49,7 @@ void ListMoveItem(QListWidget* list, int direction) {
 
 void ListRemoveItem(QListWidget* list) {
     const int row = list->currentRow();
-    if (row < 0)
-        return;
+    if (row < 0) return;
     delete list->takeItem(row);
     const int count = list->count();
     list->setCurrentRow(count == 0 ? -1 : std::min(row, count - 1));

@@ -44,12 +44,13 @@ void frm_MyMsgBox::SetMessage(const QString& message) {
     update();
 }
 
-void frm_MyMsgBox::SetWhichButtons(int buttons) { whichButtons_ = buttons; }
+void frm_MyMsgBox::SetWhichButtons(int buttons) {
+    whichButtons_ = buttons;
+}
 
 void frm_MyMsgBox::showEvent(QShowEvent* event) {
     QDialog::showEvent(event);
-    if (!active_)
-        Activate();
+    if (!active_) Activate();
 }
 
 void frm_MyMsgBox::hideEvent(QHideEvent* event) {
@@ -80,8 +81,8 @@ void frm_MyMsgBox::LayOut() {
         buttonSize_ = buttonSize_.expandedTo(buttons_[i]->sizeHint());
     }
     // The rules give the text area; a message with many line breaks may need more.
-    const MsgBoxLayout rough = ComputeMsgBoxLayout(int(message_.size()), letter, buttonSize_,
-                                                   whichButtons_);
+    const MsgBoxLayout rough =
+        ComputeMsgBoxLayout(int(message_.size()), letter, buttonSize_, whichButtons_);
     const int needed = WrappedTextHeight(message_, font(), rough.textRect.width());
     layout_ = ComputeMsgBoxLayout(int(message_.size()), letter, buttonSize_, whichButtons_, needed);
 
@@ -92,8 +93,8 @@ void frm_MyMsgBox::LayOut() {
         button->setVisible(i < layout_.buttonCount);
         button->setDefault(i == 0);
     }
-    countDown_->setGeometry(kTextLeft, layout_.buttonTop, metrics.horizontalAdvance(QLatin1String("000")),
-                            buttonSize_.height());
+    countDown_->setGeometry(kTextLeft, layout_.buttonTop,
+                            metrics.horizontalAdvance(QLatin1String("000")), buttonSize_.height());
     setFixedSize(layout_.width, layout_.height);
     buttons_[0]->setFocus();
 }
@@ -121,7 +122,9 @@ void frm_MyMsgBox::Answer(int index) {
     Close();
 }
 
-void frm_MyMsgBox::Close() { done(response_); }
+void frm_MyMsgBox::Close() {
+    done(response_);
+}
 
 void frm_MyMsgBox::reject() {
     // Closing the window gives the default answer, as the count-down would.
@@ -143,7 +146,8 @@ void frm_MyMsgBox::paintEvent(QPaintEvent* event) {
     QPainter painter(this);
     painter.setPen(palette().color(QPalette::WindowText));
     painter.setClipRect(layout_.textRect);
-    WrapText(message_, font(), layout_.textRect.width())->draw(&painter, layout_.textRect.topLeft());
+    WrapText(message_, font(), layout_.textRect.width())
+        ->draw(&painter, layout_.textRect.topLeft());
 }
 
 } // namespace quorvel
