@@ -6,6 +6,7 @@
 #include "common/recorders.h"
 
 #include <QApplication>
+#include <QLabel>
 #include <QMessageBox>
 #include <QPushButton>
 #include <QTest>
@@ -119,6 +120,29 @@ TEST_F(TimedBoxTest, UnansweredBoxReturnsTheDefaultOfItsSet) {
     EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), kButtonsRetryCancel),
               kAnswerRetry);
     EXPECT_FALSE(prompter.Box()->isVisible());
+}
+
+TEST(CountDownTest, TicksCountFourThreeTwoOneThenEnd) {
+    // Ticks a second apart after a 5-second start, each a little early or late.
+    EXPECT_EQ(frm_MyMsgBox::SecondsLeft(4003), 4);
+    EXPECT_EQ(frm_MyMsgBox::SecondsLeft(2996), 3);
+    EXPECT_EQ(frm_MyMsgBox::SecondsLeft(2004), 2);
+    EXPECT_EQ(frm_MyMsgBox::SecondsLeft(997), 1);
+    EXPECT_EQ(frm_MyMsgBox::SecondsLeft(4), 0);
+    EXPECT_EQ(frm_MyMsgBox::SecondsLeft(-6), 0);
+}
+
+TEST_F(TimedBoxTest, CountDownIsShownFromItsFirstTick) {
+    ShortenWait(60ms); // ticks until the deadline, which ends the box
+    frm_MyMsgBox box;
+    auto* label = box.findChild<QLabel*>(QStringLiteral("Lbl_CountDown"));
+    ASSERT_NE(label, nullptr);
+    box.SetMessage(QStringLiteral("Unattended"));
+    box.show();
+    EXPECT_FALSE(label->isVisibleTo(&box));
+    EXPECT_TRUE(QTest::qWaitFor([&] { return !box.isVisible(); }, 2000));
+    EXPECT_EQ(box.Response(), kAnswerOk);
+    EXPECT_FALSE(label->isVisibleTo(&box));
 }
 
 TEST_F(TimedBoxTest, ClickedButtonGivesItsAnswer) {

@@ -95,6 +95,14 @@ TEST_F(ProgressBarTest, StylesPlaceTheCaption) {
     EXPECT_GT(CountPixels(image, 150, kWidth, WhiteText), 0);
 }
 
+TEST_F(ProgressBarTest, ResizedBarKeepsItsShare) {
+    bar.Initialise(1000, 0, QStringLiteral("bytes"));
+    bar.Show(500, QStringLiteral("a"));
+    bar.resize(400, kHeight);
+    EXPECT_EQ(bar.BarWidth(), 200);
+    EXPECT_EQ(QColor(bar.grab().toImage().pixel(199, kHeight - 1)), CProgress::kBarColour);
+}
+
 TEST_F(ProgressBarTest, WidthInEveryMode) {
     EXPECT_EQ(CProgress::BarWidthFor(50, -1, kWidth), 100);  // percentages
     EXPECT_EQ(CProgress::BarWidthFor(0, 0, kWidth), kWidth); // no total: full

@@ -36,6 +36,7 @@ frm_MyMsgBox::frm_MyMsgBox(QWidget* parent) : QDialog(parent) {
     countDown_->setObjectName(QStringLiteral("Lbl_CountDown"));
     countDown_->hide();
     timer_.setObjectName(QStringLiteral("Timer1"));
+    timer_.setSingleShot(true);
     connect(&timer_, &QTimer::timeout, this, &frm_MyMsgBox::CountDown);
 }
 
@@ -69,7 +70,7 @@ void frm_MyMsgBox::Activate() {
     const auto wait = std::max<qint64>(1, CurrentClock().Waits().messageBox.count());
     deadline_ = QDeadlineTimer(wait);
     countDown_->hide();
-    timer_.start(static_cast<int>(std::min<qint64>(1000, wait)));
+    StartTick();
 }
 
 void frm_MyMsgBox::LayOut() {
@@ -99,21 +100,29 @@ void frm_MyMsgBox::LayOut() {
     buttons_[0]->setFocus();
 }
 
-int frm_MyMsgBox::SecondsLeft() const {
+int frm_MyMsgBox::SecondsLeft(qint64 remainingMs) {
     // Rounded to the nearest second so that a tick arriving a little early or
     // late still counts 4, 3, 2, 1, 0.
-    return static_cast<int>((deadline_.remainingTimeNSecs() / 1000000 + 500) / 1000);
+    return remainingMs <= 0 ? 0 : static_cast<int>((remainingMs + 500) / 1000);
+}
+
+void frm_MyMsgBox::StartTick() {
+    // Whole seconds apart, the last tick exactly at the deadline.
+    const qint64 remaining = std::max<qint64>(1, deadline_.remainingTime());
+    timer_.start(static_cast<int>(std::min<qint64>(1000, remaining)));
 }
 
 void frm_MyMsgBox::CountDown() {
-    const int left = deadline_.hasExpired() ? 0 : SecondsLeft();
+    const int left = SecondsLeft(deadline_.remainingTime());
     countDown_->setText(QString::number(left));
     countDown_->show();
-    if (left <= 0) {
-        timer_.stop();
-        countDown_->hide();
-        Close();
+    if (left > 0) {
+        StartTick();
+        return;
     }
+    timer_.stop();
+    countDown_->hide();
+    Close();
 }
 
 void frm_MyMsgBox::Answer(int index) {

@@ -100,6 +100,10 @@ Qt::Alignment CProgress::CaptionAlignment() const {
     }
 }
 
+int CProgress::BarWidth() const {
+    return shown_ && !finished_ ? BarWidthFor(value_, total_, width()) : 0;
+}
+
 void CProgress::paintEvent(QPaintEvent*) {
     QPainter painter(this);
     painter.fillRect(rect(), kBackColour);
@@ -115,9 +119,10 @@ void CProgress::PaintBar(QPainter& painter) {
         return;
     }
     painter.drawText(area, flags | CaptionAlignment(), caption_);
-    if (barWidth_ <= 0) return;
+    const int barWidth = BarWidth(); // from the area as it is now
+    if (barWidth <= 0) return;
 
-    const QRect bar(0, 0, barWidth_, area.height());
+    const QRect bar(0, 0, barWidth, area.height());
     painter.fillRect(bar, kBarColour);
     painter.setClipRect(bar);
     painter.setPen(kBarTextColour);
@@ -125,7 +130,7 @@ void CProgress::PaintBar(QPainter& painter) {
     // colour where the bar ends; style 3 instead carries it at the bar's end
     // once the bar is wide enough for it.
     const bool travel =
-        style_ == 3 && painter.fontMetrics().horizontalAdvance(caption_) <= barWidth_;
+        style_ == 3 && painter.fontMetrics().horizontalAdvance(caption_) <= barWidth;
     if (travel)
         painter.drawText(bar, flags | Qt::AlignRight, caption_);
     else
