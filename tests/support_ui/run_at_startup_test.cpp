@@ -16,20 +16,12 @@ namespace {
 // Points the desktop's configuration folder at a temporary folder.
 class AutostartTest : public ::testing::Test {
 protected:
-    AutostartTest()
-        : saved_(qgetenv("XDG_CONFIG_HOME")),
-          hadValue_(qEnvironmentVariableIsSet("XDG_CONFIG_HOME")) {
+    AutostartTest() : saved_(qgetenv("XDG_CONFIG_HOME")) {
         qputenv("XDG_CONFIG_HOME", home.Path().toUtf8());
     }
-    ~AutostartTest() override {
-        if (hadValue_)
-            qputenv("XDG_CONFIG_HOME", saved_);
-        else
-            qunsetenv("XDG_CONFIG_HOME");
-    }
+    ~AutostartTest() override { qputenv("XDG_CONFIG_HOME", saved_); }
     QString Entry() const {
-        return home.File(QStringLiteral("autostart/") + ProgramHome::ProgramName() +
-                         QStringLiteral(".desktop"));
+        return QStringLiteral("autostart/%1.desktop").arg(ProgramHome::ProgramName());
     }
 
     testing::RecordingPorts ports;
@@ -37,84 +29,51 @@ protected:
 
 private:
     QByteArray saved_;
-    bool hadValue_;
 };
 
-TEST_F(AutostartTest, EntryLivesInTheConfiguredAutostartFolder) {
-    EXPECT_EQ(ShortcutFileName(false), Entry());
-    qunsetenv("XDG_CONFIG_HOME");
-    EXPECT_TRUE(ShortcutFileName(false).endsWith(QStringLiteral("/.config/autostart/") +
-                                                 ProgramHome::ProgramName() + ".desktop"));
-}
-
-TEST_F(AutostartTest, SwitchingOnWritesAnEntryThatStartsWithS) {
+TEST_F(AutostartTest, SwitchingOnAndOffWritesAndRemovesTheEntry) {
+    EXPECT_EQ(ShortcutFileName(false), home.File(Entry()));
     EXPECT_EQ(GetRunAtStartup(false, QStringLiteral("/S")), 0);
     SetRunAtStartup(1, false, QStringLiteral("/S"));
     EXPECT_EQ(GetRunAtStartup(false, QStringLiteral("/S")), 1);
-    const QByteArray entry =
-        home.Read(QStringLiteral("autostart/") + ProgramHome::ProgramName() + ".desktop");
-    EXPECT_TRUE(entry.startsWith("[Desktop Entry]\n"));
-    EXPECT_TRUE(entry.contains("\nType=Application\n"));
+    const QByteArray entry = home.Read(Entry());
+    EXPECT_TRUE(entry.startsWith("[Desktop Entry]\nType=Application\n"));
     EXPECT_TRUE(
         entry.contains("\nExec=" + QCoreApplication::applicationFilePath().toUtf8() + " /S\n"));
+    SetRunAtStartup(0, false, QStringLiteral("/S"));
+    EXPECT_EQ(GetRunAtStartup(false, QStringLiteral("/S")), 0);
+    SetRunAtStartup(0, false, QStringLiteral("/S")); // none there: quietly nothing
     EXPECT_TRUE(ports.prompter.shown.empty());
 }
 
 TEST_F(AutostartTest, AnExistingEntryIsLeftUnchanged) {
-    home.Write(QStringLiteral("autostart/") + ProgramHome::ProgramName() + ".desktop",
-               "[Desktop Entry]\nExec=/elsewhere/other /S\n");
+    home.Write(Entry(), "[Desktop Entry]\nExec=/elsewhere/other /S\n");
     SetRunAtStartup(1, false, QStringLiteral("/S"));
-    EXPECT_EQ(home.Read(QStringLiteral("autostart/") + ProgramHome::ProgramName() + ".desktop"),
-              "[Desktop Entry]\nExec=/elsewhere/other /S\n");
-    EXPECT_EQ(GetRunAtStartup(false, QStringLiteral("/S")), 1);
+    EXPECT_EQ(home.Read(Entry()), "[Desktop Entry]\nExec=/elsewhere/other /S\n");
 }
 
-TEST_F(AutostartTest, SwitchingOffRemovesTheEntryAndIsQuietWhenThereIsNone) {
-    SetRunAtStartup(1, false, QStringLiteral("/S"));
-    SetRunAtStartup(0, false, QStringLiteral("/S"));
-    EXPECT_FALSE(QFile::exists(Entry()));
-    EXPECT_EQ(GetRunAtStartup(false, QStringLiteral("/S")), 0);
-    SetRunAtStartup(0, false, QStringLiteral("/S"));
-    EXPECT_TRUE(DeleteShortcutFile(Entry()));
-    EXPECT_TRUE(ports.prompter.shown.empty());
-}
-
-TEST_F(AutostartTest, UnwritableFolderIsReportedWithItsPlace) {
-    // A plain file where the configuration folder should be.
-    const QString blocker = home.Write(QStringLiteral("blocker"), "x");
-    qputenv("XDG_CONFIG_HOME", blocker.toUtf8());
+TEST_F(AutostartTest, FailuresAreReportedWithTheirPlace) {
+    home.Write(Entry() + QStringLiteral("/inside"), "x"); // a folder cannot be deleted as a file
+    EXPECT_FALSE(DeleteShortcutFile(home.File(Entry())));
+    qputenv("XDG_CONFIG_HOME", home.Write(QStringLiteral("blocker"), "x").toUtf8());
     EXPECT_FALSE(CreateShortcut(false, QStringLiteral("/S")));
-    ASSERT_EQ(ports.prompter.shown.size(), 1u);
+    ASSERT_EQ(ports.prompter.shown.size(), 2u);
+    EXPECT_TRUE(ports.prompter.shown[0].message.endsWith("RunAtStartup:DeleteShortcutFile:" +
+                                                         home.File(Entry())));
     EXPECT_TRUE(
-        ports.prompter.shown[0].message.endsWith("\r\nRunAtStartup:CreateShortcut switch= /S"));
-    EXPECT_FALSE(ports.prompter.shown[0].timed);
-    EXPECT_EQ(GetRunAtStartup(false, QStringLiteral("/S")), 0);
-}
-
-TEST_F(AutostartTest, EntryThatCannotBeDeletedIsReported) {
-    // A folder of the entry's name cannot be removed as a file.
-    home.Write(QStringLiteral("autostart/") + ProgramHome::ProgramName() + ".desktop/inside", "x");
-    EXPECT_FALSE(DeleteShortcutFile(Entry()));
-    ASSERT_EQ(ports.prompter.shown.size(), 1u);
-    EXPECT_TRUE(
-        ports.prompter.shown[0].message.endsWith("RunAtStartup:DeleteShortcutFile:" + Entry()));
+        ports.prompter.shown[1].message.endsWith("\r\nRunAtStartup:CreateShortcut switch= /S"));
+    EXPECT_FALSE(ports.prompter.shown[1].timed);
 }
 
 TEST(AutostartEntryTest, ProgramPathsAreQuotedAndEscaped) {
-    const QString plain = AutostartEntryText(
-        QStringLiteral("quorvel"), QStringLiteral("/opt/q/quorvel"), QStringLiteral("/S"));
-    EXPECT_TRUE(plain.contains(QStringLiteral("\nExec=/opt/q/quorvel /S\n")));
-    EXPECT_TRUE(plain.contains(QStringLiteral("\nComment=Porlan Schedule\n")));
-
-    const QString spaced = AutostartEntryText(
-        QStringLiteral("quorvel"), QStringLiteral("/opt/My Apps/q\"uo$rvel"), QStringLiteral("/S"));
-    EXPECT_TRUE(spaced.contains(QStringLiteral("\nExec=\"/opt/My Apps/q\\\\\"uo\\\\$rvel\" /S\n")))
-        << qPrintable(spaced);
-
-    const QString percent = AutostartEntryText(
-        QStringLiteral("quorvel"), QStringLiteral("/opt/100%/quorvel"), QStringLiteral("/S"));
-    EXPECT_TRUE(percent.contains(QStringLiteral("\nExec=/opt/100%%/quorvel /S\n")))
-        << qPrintable(percent);
+    const auto exec = [](const char* path) {
+        const QString text =
+            AutostartEntryText(QStringLiteral("q"), QString::fromUtf8(path), QStringLiteral("/S"));
+        return text.section(QStringLiteral("\nExec="), 1).section(QLatin1Char('\n'), 0, 0);
+    };
+    EXPECT_EQ(exec("/opt/q/quorvel"), "/opt/q/quorvel /S");
+    EXPECT_EQ(exec("/opt/My Apps/q\"uo$rvel"), "\"/opt/My Apps/q\\\\\"uo\\\\$rvel\" /S");
+    EXPECT_EQ(exec("/opt/100%/quorvel"), "/opt/100%%/quorvel /S");
 }
 
 } // namespace
