@@ -1,4 +1,6 @@
 #pragma once
+// Note: `crypt` shares its name with the C library's crypt(3); call it qualified
+// (quorvel::crypt) where <unistd.h> may be in scope.
 // RC4 over single-byte character codes, used for the FTP password that a
 // configuration file carries as hexadecimal text.
 

@@ -1,0 +1,100 @@
+#include "support/ini_store.h"
+
+#include "common/temp_home.h"
+
+#include <QFile>
+#include <QFileInfo>
+
+#include <gtest/gtest.h>
+
+using namespace quorvel;
+using quorvel::testing::TempHome;
+
+TEST(IniStore, MissingFileOrKeyGivesTheDefault) {
+    TempHome home;
+    IniStore ini(home.File("none.ini"));
+    EXPECT_EQ(ini.Read("General", "Key", "dflt"), QString("dflt"));
+    EXPECT_FALSE(QFile::exists(home.File("none.ini")));
+    ASSERT_TRUE(ini.Write("General", "Other", "1"));
+    EXPECT_EQ(ini.Read("General", "Key", "dflt"), QString("dflt"));
+    EXPECT_EQ(ini.Read("Elsewhere", "Other", "d"), QString("d"));
+}
+
+TEST(IniStore, KeysAndSectionsIgnoreCase) {
+    TempHome home;
+    const QString path = home.Write("s.ini", "[general]\r\n  userid = abc  \r\n");
+    IniStore ini(path);
+    EXPECT_EQ(ini.Read("General", "UserID", ""), QString("abc"));
+    ASSERT_TRUE(ini.Write("GENERAL", "USERID", "xyz"));
+    EXPECT_EQ(ini.Read("General", "userid", ""), QString("xyz"));
+    // Replaced in place, with the file's own line ends.
+    EXPECT_EQ(home.Read("s.ini"), QByteArray("[general]\r\nUSERID=xyz\r\n"));
+}
+
+TEST(IniStore, ReadsAtMost255Characters) {
+    TempHome home;
+    IniStore ini(home.File("s.ini"));
+    ASSERT_TRUE(ini.Write("General", "Long", QString(300, 'x')));
+    EXPECT_EQ(ini.Read("General", "Long", "").size(), 255);
+}
+
+TEST(IniStore, OtherSectionsKeysAndCommentsSurviveAWrite) {
+    TempHome home;
+    const QByteArray before = "; my comment\n[Other]\nkeep=1\n\n[General]\nA=1\ngarbage line\n"
+                              "B=2\n\n[Tail]\nz=9\n";
+    const QString path = home.Write("s.ini", before);
+    IniStore ini(path);
+    ASSERT_TRUE(ini.Write("General", "A", "10"));
+    ASSERT_TRUE(ini.Write("General", "C", "3"));
+    ASSERT_TRUE(ini.Write("New", "n", "v"));
+    EXPECT_EQ(home.Read("s.ini"),
+              QByteArray("; my comment\n[Other]\nkeep=1\n\n[General]\nA=10\ngarbage line\n"
+                         "B=2\nC=3\n\n[Tail]\nz=9\n\n[New]\nn=v\n"));
+    EXPECT_EQ(ini.Read("Other", "keep", ""), QString("1"));
+    EXPECT_EQ(ini.Read("General", "garbage line", "d"), QString("d"));
+}
+
+TEST(IniStore, ValuesCannotBreakTheFile) {
+    TempHome home;
+    IniStore ini(home.File("s.ini"));
+    ASSERT_TRUE(ini.Write("General", "Password", "a\r\n[Evil]\r\nx=1"));
+    ASSERT_TRUE(ini.Write("General", "Next", "2"));
+    EXPECT_EQ(ini.Read("Evil", "x", "none"), QString("none"));
+    EXPECT_EQ(ini.Read("General", "Next", ""), QString("2"));
+}
+
+TEST(IniStore, NewFileIsReadableByItsOwnerOnly) {
+    TempHome home;
+    IniStore ini(home.File("s.ini"));
+    ASSERT_TRUE(ini.Write("General", "Password", "secret"));
+    const QFileDevice::Permissions p = QFileInfo(home.File("s.ini")).permissions();
+    EXPECT_TRUE(p & QFileDevice::ReadOwner);
+    EXPECT_FALSE(p & (QFileDevice::ReadGroup | QFileDevice::ReadOther | QFileDevice::WriteGroup |
+                      QFileDevice::WriteOther));
+}
+
+TEST(IniStore, AWriteIntoAnUnwritableFolderFailsAndKeepsTheOldFile) {
+    TempHome home;
+    IniStore ini(home.File("missing-folder/s.ini"));
+    EXPECT_FALSE(ini.Write("General", "A", "1"));
+}
+
+TEST(LocalSettings, NullMeansEmptyInAnyCase) {
+    TempHome home;
+    LocalSettings settings(home.File("q.ini"));
+    ASSERT_TRUE(settings.SaveLocalSetting("Password", ""));
+    EXPECT_EQ(IniStore(home.File("q.ini")).Read("General", "Password", ""), QString("Null"));
+    EXPECT_EQ(settings.GetLocalSetting("Password", "dflt"), QString());
+    home.Write("q.ini", "[General]\nA=NULL\nB=nUlL\nC=Nullify\n");
+    EXPECT_EQ(settings.GetLocalSetting("A", "d"), QString());
+    EXPECT_EQ(settings.GetLocalSetting("B", "d"), QString());
+    EXPECT_EQ(settings.GetLocalSetting("C", "d"), QString("Nullify"));
+    EXPECT_EQ(settings.GetLocalSetting("Missing", "3 hrs"), QString("3 hrs"));
+}
+
+TEST(LocalSettings, EditedValueSurvivesANewReader) {
+    TempHome home;
+    ASSERT_TRUE(LocalSettings(home.File("q.ini")).SaveLocalSetting("Interval", "6 hours"));
+    EXPECT_EQ(LocalSettings(home.File("q.ini")).GetLocalSetting("Interval", "3 hrs"),
+              QString("6 hours"));
+}
