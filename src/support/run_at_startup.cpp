@@ -25,8 +25,9 @@ QString ConfigFolder(bool allUsers) {
         const QString first = dirs.section(QLatin1Char(':'), 0, 0);
         return first.isEmpty() ? QStringLiteral("/etc/xdg") : first;
     }
+    // A relative XDG_CONFIG_HOME is invalid and ignored, as desktops do.
     const QString home = env.value(QStringLiteral("XDG_CONFIG_HOME"));
-    return home.isEmpty() ? QDir::homePath() + QStringLiteral("/.config") : home;
+    return QDir::isAbsolutePath(home) ? home : QDir::homePath() + QStringLiteral("/.config");
 }
 
 // One argument of an Exec line: quoted when it holds a reserved character,

@@ -43,7 +43,10 @@ TEST_F(ListTest, AddInsertsBeforeTheSelectionOrAppends) {
 
 TEST_F(ListTest, MoveSwapsWithANeighbourOnlyWhenThereIsOne) {
     list.setCurrentRow(2);
+    int rowChanges = 0; // the window loads a record on each change
+    QObject::connect(&list, &QListWidget::currentRowChanged, [&] { ++rowChanges; });
     ListMoveItem(&list, 1);
+    EXPECT_EQ(rowChanges, 1);
     EXPECT_EQ(Items(list), "a1 c3 b2");
     EXPECT_EQ(ListItemDataValue(&list), 3);
     list.setCurrentRow(0);
@@ -61,6 +64,10 @@ TEST_F(ListTest, MoveSwapsWithANeighbourOnlyWhenThereIsOne) {
 TEST_F(ListTest, RemoveSelectsTheNextTheNewLastOrNothing) {
     list.setCurrentRow(-1);
     ListRemoveItem(&list); // nothing selected: nothing removed
+    list.setCurrentRow(0);
+    list.item(0)->setSelected(false); // current but unselected: the user sees no choice
+    ListRemoveItem(&list);
+    EXPECT_EQ(ListItemDataValue(&list), 0);
     list.setCurrentRow(1);
     ListRemoveItem(&list);
     EXPECT_EQ(Items(list), "a1 c3");
