@@ -5,6 +5,7 @@
 
 #include <QFontMetrics>
 #include <QGuiApplication>
+#include <QHideEvent>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QPainter>
@@ -56,6 +57,9 @@ void frm_MyMsgBox::showEvent(QShowEvent* event) {
 
 void frm_MyMsgBox::hideEvent(QHideEvent* event) {
     QDialog::hideEvent(event);
+    // A box whose owner is minimised (start-up mode) may be hidden by the
+    // desktop; it must go on counting down, or an unattended run would hang.
+    if (event->spontaneous()) return;
     timer_.stop();
     active_ = false;
 }
