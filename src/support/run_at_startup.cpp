@@ -25,8 +25,9 @@ QString ConfigFolder(bool allUsers) {
         const QString first = dirs.section(QLatin1Char(':'), 0, 0);
         return first.isEmpty() ? QStringLiteral("/etc/xdg") : first;
     }
+    // A relative XDG_CONFIG_HOME is invalid and ignored, as desktops do.
     const QString home = env.value(QStringLiteral("XDG_CONFIG_HOME"));
-    return home.isEmpty() ? QDir::homePath() + QStringLiteral("/.config") : home;
+    return QDir::isAbsolutePath(home) ? home : QDir::homePath() + QStringLiteral("/.config");
 }
 
 // One argument of an Exec line: quoted when it holds a reserved character,
@@ -43,8 +44,7 @@ QString ExecArgument(const QString& argument) {
             out += QLatin1Char('\\');
         out += c;
     }
-    if (quote)
-        out = QLatin1Char('"') + out + QLatin1Char('"');
+    if (quote) out = QLatin1Char('"') + out + QLatin1Char('"');
     // Field codes start with "%"; a literal one is doubled.
     out.replace(QLatin1Char('%'), QLatin1String("%%"));
     // The whole value is a string of the entry file, where "\" is escaped too.
@@ -52,7 +52,9 @@ QString ExecArgument(const QString& argument) {
     return out;
 }
 
-bool FileFound(const QString& path) { return QFileInfo::exists(path); }
+bool FileFound(const QString& path) {
+    return QFileInfo::exists(path);
+}
 
 } // namespace
 
@@ -77,8 +79,7 @@ QString ShortcutFileName(bool allUsers) {
 
 bool CreateShortcut(bool allUsers, const QString& arguments) {
     const QString path = ShortcutFileName(allUsers);
-    if (FileFound(path))
-        return true;
+    if (FileFound(path)) return true;
     const QString where = kWhere + QStringLiteral("CreateShortcut switch= ") + arguments;
     if (!QDir().mkpath(QFileInfo(path).absolutePath()))
         return ShowErrorBox(QStringLiteral("Cannot create the folder of ") + path, where);
@@ -91,11 +92,11 @@ bool CreateShortcut(bool allUsers, const QString& arguments) {
 }
 
 bool DeleteShortcutFile(const QString& path) {
-    if (!FileFound(path))
-        return true;
+    if (!FileFound(path)) return true;
     QFile file(path);
     if (!file.remove())
-        return ShowErrorBox(file.errorString(), kWhere + QStringLiteral("DeleteShortcutFile:") + path);
+        return ShowErrorBox(file.errorString(),
+                            kWhere + QStringLiteral("DeleteShortcutFile:") + path);
     return true;
 }
 

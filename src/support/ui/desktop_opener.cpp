@@ -12,6 +12,8 @@ bool OpenWithDesktop(const QString& file) {
     return QDesktopServices::openUrl(QUrl::fromLocalFile(file));
 }
 
-void InstallDesktopOpener() { SetDesktopOpener(&OpenWithDesktop); }
+void InstallDesktopOpener() {
+    SetDesktopOpener(&OpenWithDesktop);
+}
 
 } // namespace quorvel

@@ -28,11 +28,9 @@ bool BrowseForFolder(QWidget* owner, QString& folder, const QString& word) {
     start.replace(QLatin1Char('\\'), QLatin1Char('/'));
     const QString prompt = QStringLiteral("Choose ") + word + QStringLiteral(" folder");
     const QUrl chosen = CurrentDialog()(owner, prompt, start);
-    if (chosen.isEmpty() || !chosen.isLocalFile())
-        return false;
+    if (chosen.isEmpty() || !chosen.isLocalFile()) return false;
     const QString path = chosen.toLocalFile();
-    if (path.isEmpty())
-        return false;
+    if (path.isEmpty()) return false;
     folder = QDir::toNativeSeparators(QDir::cleanPath(path));
     return true;
 }
@@ -40,6 +38,8 @@ bool BrowseForFolder(QWidget* owner, QString& folder, const QString& word) {
 ScopedFolderDialog::ScopedFolderDialog(FolderDialog dialog)
     : saved_(std::exchange(CurrentDialog(), std::move(dialog))) {}
 
-ScopedFolderDialog::~ScopedFolderDialog() { CurrentDialog() = std::move(saved_); }
+ScopedFolderDialog::~ScopedFolderDialog() {
+    CurrentDialog() = std::move(saved_);
+}
 
 } // namespace quorvel

@@ -1,6 +1,7 @@
 #pragma once
 // Operations on the window's lists: each item carries a 32-bit number in
-// Qt::UserRole (its item data); "selected" is the list's current row.
+// Qt::UserRole (its item data); "selected" is the current row while its item
+// is selected.
 
 #include <cstdint>
 

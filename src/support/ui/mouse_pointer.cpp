@@ -6,8 +6,7 @@
 namespace quorvel {
 
 CMousePointer::~CMousePointer() {
-    if (saved_)
-        QGuiApplication::restoreOverrideCursor();
+    if (saved_) QGuiApplication::restoreOverrideCursor();
 }
 
 void CMousePointer::SetMousePointer(Qt::CursorShape shape) {
@@ -32,8 +31,7 @@ void OverrideBusyPointer::Push() {
 }
 
 void OverrideBusyPointer::Pop() {
-    if (depth_ == 0)
-        return;
+    if (depth_ == 0) return;
     QGuiApplication::restoreOverrideCursor();
     --depth_;
 }

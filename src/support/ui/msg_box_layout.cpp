@@ -33,9 +33,11 @@ MsgBoxLayout ComputeMsgBoxLayout(int messageLength, QSize letter, QSize button, 
                                  int neededTextHeight) {
     MsgBoxLayout out;
     out.charsPerLine = messageLength >= 50 ? 40 : 20;
-    out.lines = std::max(3, static_cast<int>(RoundHalfEven(double(messageLength) / out.charsPerLine)));
+    out.lines =
+        std::max(3, static_cast<int>(RoundHalfEven(double(messageLength) / out.charsPerLine)));
     const int textWidth = std::max(kMsgBoxMinTextWidth, out.charsPerLine * letter.width());
-    const int textHeight = std::max({kMsgBoxMinTextHeight, out.lines * letter.height(), neededTextHeight});
+    const int textHeight =
+        std::max({kMsgBoxMinTextHeight, out.lines * letter.height(), neededTextHeight});
     out.textRect = QRect(kTextLeft, kTextTop, textWidth, textHeight);
 
     out.buttonTop = textHeight + 32;

@@ -15,9 +15,9 @@ inline constexpr int kMsgBoxMinTextHeight = 60;
 struct MsgBoxLayout {
     int charsPerLine = 0;
     int lines = 0;
-    QRect textRect;   // where the message is drawn, word-wrapped
-    int width = 0;    // client width of the box
-    int height = 0;   // client height of the box
+    QRect textRect; // where the message is drawn, word-wrapped
+    int width = 0;  // client width of the box
+    int height = 0; // client height of the box
     int buttonTop = 0;
     int buttonCount = 0;
     std::array<int, 3> buttonLeft{}; // left edge of buttons 0, 1, 2 (unused ones 0)

@@ -5,6 +5,7 @@
 
 #include <QFontMetrics>
 #include <QGuiApplication>
+#include <QHideEvent>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QPainter>
@@ -36,6 +37,7 @@ frm_MyMsgBox::frm_MyMsgBox(QWidget* parent) : QDialog(parent) {
     countDown_->setObjectName(QStringLiteral("Lbl_CountDown"));
     countDown_->hide();
     timer_.setObjectName(QStringLiteral("Timer1"));
+    timer_.setSingleShot(true);
     connect(&timer_, &QTimer::timeout, this, &frm_MyMsgBox::CountDown);
 }
 
@@ -44,16 +46,20 @@ void frm_MyMsgBox::SetMessage(const QString& message) {
     update();
 }
 
-void frm_MyMsgBox::SetWhichButtons(int buttons) { whichButtons_ = buttons; }
+void frm_MyMsgBox::SetWhichButtons(int buttons) {
+    whichButtons_ = buttons;
+}
 
 void frm_MyMsgBox::showEvent(QShowEvent* event) {
     QDialog::showEvent(event);
-    if (!active_)
-        Activate();
+    if (!active_) Activate();
 }
 
 void frm_MyMsgBox::hideEvent(QHideEvent* event) {
     QDialog::hideEvent(event);
+    // A box whose owner is minimised (start-up mode) may be hidden by the
+    // desktop; it must go on counting down, or an unattended run would hang.
+    if (event->spontaneous()) return;
     timer_.stop();
     active_ = false;
 }
@@ -68,7 +74,7 @@ void frm_MyMsgBox::Activate() {
     const auto wait = std::max<qint64>(1, CurrentClock().Waits().messageBox.count());
     deadline_ = QDeadlineTimer(wait);
     countDown_->hide();
-    timer_.start(static_cast<int>(std::min<qint64>(1000, wait)));
+    StartTick();
 }
 
 void frm_MyMsgBox::LayOut() {
@@ -80,8 +86,8 @@ void frm_MyMsgBox::LayOut() {
         buttonSize_ = buttonSize_.expandedTo(buttons_[i]->sizeHint());
     }
     // The rules give the text area; a message with many line breaks may need more.
-    const MsgBoxLayout rough = ComputeMsgBoxLayout(int(message_.size()), letter, buttonSize_,
-                                                   whichButtons_);
+    const MsgBoxLayout rough =
+        ComputeMsgBoxLayout(int(message_.size()), letter, buttonSize_, whichButtons_);
     const int needed = WrappedTextHeight(message_, font(), rough.textRect.width());
     layout_ = ComputeMsgBoxLayout(int(message_.size()), letter, buttonSize_, whichButtons_, needed);
 
@@ -92,27 +98,35 @@ void frm_MyMsgBox::LayOut() {
         button->setVisible(i < layout_.buttonCount);
         button->setDefault(i == 0);
     }
-    countDown_->setGeometry(kTextLeft, layout_.buttonTop, metrics.horizontalAdvance(QLatin1String("000")),
-                            buttonSize_.height());
+    countDown_->setGeometry(kTextLeft, layout_.buttonTop,
+                            metrics.horizontalAdvance(QLatin1String("000")), buttonSize_.height());
     setFixedSize(layout_.width, layout_.height);
     buttons_[0]->setFocus();
 }
 
-int frm_MyMsgBox::SecondsLeft() const {
+int frm_MyMsgBox::SecondsLeft(qint64 remainingMs) {
     // Rounded to the nearest second so that a tick arriving a little early or
     // late still counts 4, 3, 2, 1, 0.
-    return static_cast<int>((deadline_.remainingTimeNSecs() / 1000000 + 500) / 1000);
+    return remainingMs <= 0 ? 0 : static_cast<int>((remainingMs + 500) / 1000);
+}
+
+void frm_MyMsgBox::StartTick() {
+    // Whole seconds apart, the last tick exactly at the deadline.
+    const qint64 remaining = std::max<qint64>(1, deadline_.remainingTime());
+    timer_.start(static_cast<int>(std::min<qint64>(1000, remaining)));
 }
 
 void frm_MyMsgBox::CountDown() {
-    const int left = deadline_.hasExpired() ? 0 : SecondsLeft();
+    const int left = SecondsLeft(deadline_.remainingTime());
     countDown_->setText(QString::number(left));
     countDown_->show();
-    if (left <= 0) {
-        timer_.stop();
-        countDown_->hide();
-        Close();
+    if (left > 0) {
+        StartTick();
+        return;
     }
+    timer_.stop();
+    countDown_->hide();
+    Close();
 }
 
 void frm_MyMsgBox::Answer(int index) {
@@ -121,7 +135,9 @@ void frm_MyMsgBox::Answer(int index) {
     Close();
 }
 
-void frm_MyMsgBox::Close() { done(response_); }
+void frm_MyMsgBox::Close() {
+    done(response_);
+}
 
 void frm_MyMsgBox::reject() {
     // Closing the window gives the default answer, as the count-down would.
@@ -143,7 +159,8 @@ void frm_MyMsgBox::paintEvent(QPaintEvent* event) {
     QPainter painter(this);
     painter.setPen(palette().color(QPalette::WindowText));
     painter.setClipRect(layout_.textRect);
-    WrapText(message_, font(), layout_.textRect.width())->draw(&painter, layout_.textRect.topLeft());
+    WrapText(message_, font(), layout_.textRect.width())
+        ->draw(&painter, layout_.textRect.topLeft());
 }
 
 } // namespace quorvel

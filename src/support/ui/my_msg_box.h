@@ -37,6 +37,9 @@ public:
     QRect TextRect() const { return layout_.textRect; }
     QSize ButtonSize() const { return buttonSize_; }
 
+    // The count-down's figure for the time left; 0 ends the box.
+    static int SecondsLeft(qint64 remainingMs);
+
 protected:
     void showEvent(QShowEvent* event) override;
     void hideEvent(QHideEvent* event) override;
@@ -50,7 +53,7 @@ private:
     void CountDown();
     void Answer(int index);
     void Close();
-    int SecondsLeft() const;
+    void StartTick();
 
     QString message_;
     int whichButtons_ = 0;

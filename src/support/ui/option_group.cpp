@@ -19,8 +19,7 @@ void Uncheck(QRadioButton* button) {
 } // namespace
 
 void SetOptionIndex(OptionGroup group, int index) {
-    if (group.empty())
-        return;
+    if (group.empty()) return;
     if (index == -1) {
         for (QRadioButton* button : group)
             Uncheck(button);
@@ -29,8 +28,7 @@ void SetOptionIndex(OptionGroup group, int index) {
     const auto chosen = static_cast<std::size_t>(std::clamp<int>(index, 0, int(group.size()) - 1));
     // Buttons of one group need not share a parent, so clear the others by hand.
     for (std::size_t i = 0; i < group.size(); ++i) {
-        if (i != chosen)
-            Uncheck(group[i]);
+        if (i != chosen) Uncheck(group[i]);
     }
     group[chosen]->setChecked(true);
 }

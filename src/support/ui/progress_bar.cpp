@@ -13,6 +13,7 @@ namespace {
 
 constexpr int kFontPoints = 8;
 constexpr double kSecondsPerDay = 86400.0;
+constexpr int kSummaryIndent = 3; // the summary has no leading blank of its own
 
 } // namespace
 
@@ -23,7 +24,9 @@ CProgress::CProgress(QWidget* parent) : QWidget(parent) {
     setAttribute(Qt::WA_OpaquePaintEvent);
 }
 
-QSize CProgress::sizeHint() const { return {200, fontMetrics().height() + 4}; }
+QSize CProgress::sizeHint() const {
+    return {200, fontMetrics().height() + 4};
+}
 
 void CProgress::Initialise(std::int64_t total, int style, const QString& units) {
     total_ = total;
@@ -39,8 +42,7 @@ void CProgress::Initialise(std::int64_t total, int style, const QString& units) 
 }
 
 int CProgress::BarWidthFor(std::int64_t value, std::int64_t total, int areaWidth) {
-    if (total == 0)
-        return areaWidth;
+    if (total == 0) return areaWidth;
     const double full = total < 0 ? 100.0 : double(total);
     const double width = std::round(double(value) / full * areaWidth);
     // Values past the end (or below the start) show a full (or empty) bar.
@@ -65,8 +67,7 @@ void CProgress::Show(std::int64_t value, const QString& text) {
     const int bar = BarWidthFor(value, total_, width());
     value_ = value;
     // A transfer calls this for every block: repaint only when the picture changes.
-    if (shown_ && !finished_ && bar == barWidth_ && caption == caption_)
-        return;
+    if (shown_ && !finished_ && bar == barWidth_ && caption == caption_) return;
     barWidth_ = bar;
     caption_ = caption;
     shown_ = true;
@@ -88,8 +89,7 @@ void CProgress::Finish() {
 }
 
 Qt::Alignment CProgress::CaptionAlignment() const {
-    if (finished_)
-        return Qt::AlignLeft;
+    if (finished_) return Qt::AlignLeft;
     switch (style_) {
     case 1:
         return Qt::AlignHCenter;
@@ -100,22 +100,29 @@ Qt::Alignment CProgress::CaptionAlignment() const {
     }
 }
 
+int CProgress::BarWidth() const {
+    return shown_ && !finished_ ? BarWidthFor(value_, total_, width()) : 0;
+}
+
 void CProgress::paintEvent(QPaintEvent*) {
     QPainter painter(this);
     painter.fillRect(rect(), kBackColour);
-    if (shown_)
-        PaintBar(painter);
+    if (shown_) PaintBar(painter);
 }
 
 void CProgress::PaintBar(QPainter& painter) {
     const QRect area = rect();
     const int flags = Qt::TextSingleLine | Qt::AlignVCenter;
     painter.setPen(kTextColour);
-    painter.drawText(area, flags | CaptionAlignment(), caption_);
-    if (finished_ || barWidth_ <= 0)
+    if (finished_) {
+        painter.drawText(area.adjusted(kSummaryIndent, 0, 0, 0), flags | Qt::AlignLeft, caption_);
         return;
+    }
+    painter.drawText(area, flags | CaptionAlignment(), caption_);
+    const int barWidth = BarWidth(); // from the area as it is now
+    if (barWidth <= 0) return;
 
-    const QRect bar(0, 0, barWidth_, area.height());
+    const QRect bar(0, 0, barWidth, area.height());
     painter.fillRect(bar, kBarColour);
     painter.setClipRect(bar);
     painter.setPen(kBarTextColour);
@@ -123,7 +130,7 @@ void CProgress::PaintBar(QPainter& painter) {
     // colour where the bar ends; style 3 instead carries it at the bar's end
     // once the bar is wide enough for it.
     const bool travel =
-        style_ == 3 && painter.fontMetrics().horizontalAdvance(caption_) <= barWidth_;
+        style_ == 3 && painter.fontMetrics().horizontalAdvance(caption_) <= barWidth;
     if (travel)
         painter.drawText(bar, flags | Qt::AlignRight, caption_);
     else

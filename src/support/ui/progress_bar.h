@@ -30,7 +30,7 @@ public:
     void Finish() override;
 
     // What is drawn now (for the window's readers and for tests).
-    int BarWidth() const { return barWidth_; }
+    int BarWidth() const;
     QString Caption() const { return caption_; }
     bool Finished() const { return finished_; }
 
@@ -53,7 +53,7 @@ private:
     QString units_;
     QDateTime start_;
     std::int64_t value_ = 0;
-    int barWidth_ = 0;
+    int barWidth_ = 0; // at the last Show, to skip repaints that change nothing
     QString caption_;
     bool shown_ = false;
     bool finished_ = false;

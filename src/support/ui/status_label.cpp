@@ -6,8 +6,7 @@
 namespace quorvel {
 
 void SetStatusLabel(QLabel* label, const QString& text) {
-    if (label == nullptr)
-        return;
+    if (label == nullptr) return;
     QPalette palette = label->palette();
     const QColor face = QApplication::palette(label).color(QPalette::Button);
     palette.setColor(QPalette::Window, text.isEmpty() ? face : kStatusHighlight);

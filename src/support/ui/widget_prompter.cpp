@@ -57,18 +57,18 @@ QMessageBox::StandardButton StandardFor(int answer) {
 
 WidgetPrompter::WidgetPrompter(QWidget* parent) : parent_(parent) {}
 
-WidgetPrompter::~WidgetPrompter() { delete box_.data(); }
+WidgetPrompter::~WidgetPrompter() {
+    delete box_.data();
+}
 
 frm_MyMsgBox* WidgetPrompter::Box() {
-    if (!box_)
-        box_ = new frm_MyMsgBox(parent_);
+    if (!box_) box_ = new frm_MyMsgBox(parent_);
     return box_;
 }
 
 int WidgetPrompter::MyMsgBox(const QString& message, int buttons) {
     frm_MyMsgBox* box = Box();
-    if (!box->isVisible())
-        return ShowTimedBox(*box, message, buttons);
+    if (!box->isVisible()) return ShowTimedBox(*box, message, buttons);
     // A question raised while the box is still open (a timer event during the
     // wait) gets a box of its own instead of taking over the open one.
     frm_MyMsgBox nested(parent_);
@@ -77,8 +77,7 @@ int WidgetPrompter::MyMsgBox(const QString& message, int buttons) {
 
 int WidgetPrompter::SystemMsgBox(const QString& message, int buttons) {
     ButtonSet set = ButtonSetFor(buttons);
-    if (set.defaultAnswer == 0)
-        set = ButtonSetFor(kButtonsOk);
+    if (set.defaultAnswer == 0) set = ButtonSetFor(kButtonsOk);
     QMessageBox box(IconFor(buttons), QGuiApplication::applicationDisplayName(), message,
                     QMessageBox::NoButton, parent_);
     bool hasCancel = false;
@@ -89,11 +88,9 @@ int WidgetPrompter::SystemMsgBox(const QString& message, int buttons) {
     box.setDefaultButton(StandardFor(set.defaultAnswer));
     box.exec();
     QAbstractButton* clicked = box.clickedButton();
-    if (clicked == nullptr)
-        return hasCancel ? kAnswerCancel : set.defaultAnswer;
+    if (clicked == nullptr) return hasCancel ? kAnswerCancel : set.defaultAnswer;
     for (int i = 0; i < set.count; ++i) {
-        if (box.button(StandardFor(set.answers[i])) == clicked)
-            return set.answers[i];
+        if (box.button(StandardFor(set.answers[i])) == clicked) return set.answers[i];
     }
     return set.defaultAnswer;
 }

@@ -28,8 +28,7 @@ std::unique_ptr<QTextLayout> WrapText(const QString& text, const QFont& font, in
 }
 
 int WrappedTextHeight(const QString& text, const QFont& font, int width) {
-    if (text.isEmpty())
-        return 0;
+    if (text.isEmpty()) return 0;
     return static_cast<int>(std::ceil(WrapText(text, font, width)->boundingRect().height()));
 }
 
