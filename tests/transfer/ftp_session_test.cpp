@@ -14,7 +14,10 @@
 
 #include <gtest/gtest.h>
 
+#include <csignal>
 #include <functional>
+
+#include <sys/resource.h>
 
 namespace quorvel {
 namespace {
@@ -171,6 +174,43 @@ TEST_F(FtpSessionTest, ServerStoppedDuringDownloadLeavesOldCopyAndReconnectsLate
         << session.LastError().toStdString();
     EXPECT_EQ(Read(local), data);
     EXPECT_EQ(peer.Logins(1), 1);
+}
+
+// The process may not write files beyond a size while it lives: writes past it
+// fail as on a full disk.
+class FileSizeLimit {
+public:
+    explicit FileSizeLimit(rlim_t bytes) {
+        getrlimit(RLIMIT_FSIZE, &saved_);
+        previous_ = std::signal(SIGXFSZ, SIG_IGN);
+        rlimit limit = saved_;
+        limit.rlim_cur = bytes;
+        setrlimit(RLIMIT_FSIZE, &limit);
+    }
+    ~FileSizeLimit() {
+        setrlimit(RLIMIT_FSIZE, &saved_);
+        std::signal(SIGXFSZ, previous_);
+    }
+
+private:
+    rlimit saved_{};
+    void (*previous_)(int) = nullptr;
+};
+
+TEST_F(FtpSessionTest, FullDiskDuringDownloadLeavesOldCopy) {
+    QFile served(OnServer(QStringLiteral("full.dat")));
+    ASSERT_TRUE(served.open(QIODevice::WriteOnly));
+    served.write(RandomBytes(8 << 20));
+    served.close();
+    const QString local = home.Write(QStringLiteral("disk/full.dat"), "old copy");
+    {
+        FileSizeLimit limit(1 << 20);
+        EXPECT_FALSE(session.Download(QStringLiteral("full.dat"), local));
+    }
+    EXPECT_TRUE(session.LastError().startsWith(QStringLiteral("FtpGetFile Error\r\n")));
+    EXPECT_EQ(Read(local), QByteArray("old copy"));
+    EXPECT_EQ(QDir(home.File(QStringLiteral("disk"))).entryList(QDir::Files | QDir::Hidden),
+              QStringList{QStringLiteral("full.dat")});
 }
 
 TEST_F(FtpSessionTest, RemoteFileBeyondFourGigabytesHasItsTrueSize) {

@@ -1,0 +1,159 @@
+// FTP download and upload of a 256 MB file over loopback, and zip and unzip of
+// a 100 MB logger-like text file; each against its command-line anchor (curl,
+// zip, unzip) on the same data. The data lives in a temporary folder that is
+// removed at the end.
+#include "peer_process.h"
+#include "transfer/ftp_session.h"
+#include "transfer/zip_archive.h"
+
+#include <benchmark/benchmark.h>
+
+#include <QCoreApplication>
+#include <QDir>
+#include <QFile>
+#include <QProcess>
+#include <QRandomGenerator>
+#include <QTemporaryDir>
+
+#include <cstdio>
+#include <cstdlib>
+
+namespace {
+
+using quorvel::testing::FtpPeer;
+
+struct Bench {
+    QTemporaryDir dir;
+    FtpPeer peer;
+    quorvel::FtpSession session;
+    QString Path(const QString& name) const { return dir.filePath(name); }
+    QString Url(const QString& name) const {
+        return QStringLiteral("ftp://") + peer.Server() + QLatin1Char('/') + name;
+    }
+};
+Bench* bench = nullptr;
+
+bool WriteFile(const QString& path, qint64 size, bool text) {
+    QFile file(path);
+    if (!file.open(QIODevice::WriteOnly)) return false;
+    QRandomGenerator generator(42);
+    QByteArray block;
+    for (qint64 written = 0, line = 0; written < size; written += block.size()) {
+        block.clear();
+        while (block.size() < (1 << 20)) {
+            if (text) {
+                block += "2024-11-01 " + QByteArray::number(line / 3600 % 24) + ':' +
+                         QByteArray::number(line / 60 % 60) + ':' + QByteArray::number(line % 60) +
+                         ',' + QByteArray::number(12.0 + generator.bounded(1000) / 100.0) + ',' +
+                         QByteArray::number(generator.bounded(100)) + ",OK\r\n";
+                ++line;
+            } else {
+                const quint32 value = generator.generate();
+                block.append(reinterpret_cast<const char*>(&value), sizeof value);
+            }
+        }
+        file.write(
+            block.left(static_cast<qsizetype>(std::min<qint64>(block.size(), size - written))));
+    }
+    return true;
+}
+
+void Run(benchmark::State& state, const QString& program, const QStringList& args,
+         const QString& workDir = QString()) {
+    for (auto _ : state) {
+        QProcess process;
+        process.setWorkingDirectory(workDir.isEmpty() ? bench->dir.path() : workDir);
+        process.start(program, args);
+        if (!process.waitForFinished(-1) || process.exitCode() != 0)
+            state.SkipWithError(qPrintable(program + QStringLiteral(" failed")));
+    }
+}
+
+void FtpDownloadOurs(benchmark::State& state) {
+    for (auto _ : state)
+        if (!bench->session.Download(QStringLiteral("big.dat"), bench->Path("down_ours.dat")))
+            state.SkipWithError(qPrintable(bench->session.LastError()));
+}
+void FtpDownloadCurl(benchmark::State& state) {
+    Run(state, QStringLiteral("curl"),
+        {"-s", "-S", "-u", "logger:secret", bench->Url("big.dat"), "-o",
+         bench->Path("down_curl.dat")});
+}
+void FtpUploadOurs(benchmark::State& state) {
+    for (auto _ : state)
+        if (!bench->session.Upload(bench->Path("local.dat"), QStringLiteral("up_ours.dat")))
+            state.SkipWithError(qPrintable(bench->session.LastError()));
+}
+void FtpUploadCurl(benchmark::State& state) {
+    Run(state, QStringLiteral("curl"),
+        {"-s", "-S", "-u", "logger:secret", "-T", bench->Path("local.dat"),
+         bench->Url("up_curl.dat")});
+}
+
+void ZipOurs(benchmark::State& state) {
+    for (auto _ : state) {
+        QFile::remove(bench->Path("ours.zip"));
+        if (quorvel::ZipFiles({bench->Path("logger.dat")}, bench->Path("ours.zip")) != 0)
+            state.SkipWithError("zip failed");
+    }
+}
+void ZipCli(benchmark::State& state) {
+    for (auto _ : state) {
+        QFile::remove(bench->Path("cli.zip"));
+        QProcess process;
+        process.setWorkingDirectory(bench->dir.path());
+        process.start(QStringLiteral("zip"), {"-q", "-j", "cli.zip", "logger.dat"});
+        if (!process.waitForFinished(-1) || process.exitCode() != 0)
+            state.SkipWithError("zip command failed");
+    }
+}
+void UnzipOurs(benchmark::State& state) {
+    for (auto _ : state)
+        if (quorvel::UnzipFile(bench->Path("cli.zip"), bench->Path("out_ours")) != 0)
+            state.SkipWithError("unzip failed");
+}
+void UnzipCli(benchmark::State& state) {
+    Run(state, QStringLiteral("unzip"), {"-o", "-q", "cli.zip", "-d", bench->Path("out_cli")});
+}
+
+void Register(const char* name, void (*function)(benchmark::State&), int repetitions) {
+    benchmark::RegisterBenchmark(name, function)
+        ->Unit(benchmark::kMillisecond)
+        ->UseRealTime()
+        ->Iterations(1)
+        ->Repetitions(repetitions)
+        ->ComputeStatistics("min", [](const std::vector<double>& v) {
+            return *std::min_element(v.begin(), v.end());
+        });
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    QCoreApplication app(argc, argv);
+    Bench data;
+    bench = &data;
+    QDir().mkpath(data.Path("root"));
+    if (!WriteFile(data.Path("root/big.dat"), 256ll << 20, false) ||
+        !WriteFile(data.Path("local.dat"), 256ll << 20, false) ||
+        !WriteFile(data.Path("logger.dat"), 100ll << 20, true) ||
+        !data.peer.Start(data.Path("root"))) {
+        std::fprintf(stderr, "transfer_bench: could not prepare the data or the FTP server\n");
+        return 1;
+    }
+    data.session.SetDetails(data.peer.Server(), QStringLiteral("logger"), QStringLiteral("secret"),
+                            false);
+    Register("ftp_download/ours", FtpDownloadOurs, 7);
+    Register("ftp_download/curl", FtpDownloadCurl, 7);
+    Register("ftp_upload/ours", FtpUploadOurs, 7);
+    Register("ftp_upload/curl", FtpUploadCurl, 7);
+    Register("zip/cli", ZipCli, 5); // first: the unzip benchmarks read its archive
+    Register("zip/ours", ZipOurs, 5);
+    Register("unzip/ours", UnzipOurs, 5);
+    Register("unzip/cli", UnzipCli, 5);
+    benchmark::Initialize(&argc, argv);
+    benchmark::RunSpecifiedBenchmarks();
+    benchmark::Shutdown();
+    data.session.Close();
+    return 0;
+}
