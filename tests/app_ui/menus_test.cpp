@@ -49,23 +49,6 @@ TEST_F(MenusTest, OpeningAListMovesItToTheTopOfTheRecentList) {
     EXPECT_EQ(window->Recent().Entry(1), home.File("files.txt"));
 }
 
-TEST_F(MenusTest, RecentNamesDifferingOnlyInCaseShareOneEntry) {
-    Start();
-    window->AddToRecentFiles("/lists/Alpha.txt");
-    window->AddToRecentFiles("/lists/beta.txt");
-    window->AddToRecentFiles("/LISTS/ALPHA.TXT");
-    EXPECT_EQ(VisibleRecent(),
-              QStringList({"/LISTS/ALPHA.TXT", "/lists/beta.txt", home.File("files.txt")}));
-}
-
-TEST_F(MenusTest, ASixthListPushesTheOldestOut) {
-    Start();
-    for (const char* name : {"/l/1.txt", "/l/2.txt", "/l/3.txt", "/l/4.txt", "/l/5.txt"})
-        window->AddToRecentFiles(name);
-    EXPECT_EQ(VisibleRecent(),
-              QStringList({"/l/5.txt", "/l/4.txt", "/l/3.txt", "/l/2.txt", "/l/1.txt"}));
-}
-
 TEST_F(MenusTest, ListFromAdministratorHidesRecentEntriesAndListCommands) {
     Start();
     C().Opt_GetFileList->Button(1)->click();

@@ -34,13 +34,6 @@ TEST_F(RecordRulesTest, AlwaysInOneDirectionExcludesAlwaysInTheOther) {
     EXPECT_EQ(Download(), kDownloadNever);
 }
 
-TEST_F(RecordRulesTest, UploadAlwaysLeavesOtherDownloadRulesAlone) {
-    C().Opt_Download->Button(kDownloadDate)->click();
-    C().Opt_Upload->Button(kUploadAlways)->click();
-    EXPECT_EQ(Download(), kDownloadDate);
-    EXPECT_EQ(Upload(), kUploadAlways);
-}
-
 TEST_F(RecordRulesTest, ZippedFilesAlwaysTravelWhole) {
     C().Opt_MethodID->Button(kMethodCompleteFile)->click();
     C().Chk_Zip->setChecked(true);

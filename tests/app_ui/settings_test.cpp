@@ -4,10 +4,12 @@
 
 #include "support/ini_store.h"
 #include "support/program_home.h"
+#include "support/ui/folder_chooser.h"
 
 #include <QDate>
 #include <QDir>
 #include <QFile>
+#include <QUrl>
 
 namespace quorvel::testing {
 namespace {
@@ -153,6 +155,25 @@ TEST_F(SettingsTest, UnstoredFieldEditsAreNotWrittenAtExit) {
     Close();
     // The list changed flag was set, so the list is written, but from the records.
     EXPECT_FALSE(home.Read("files.txt").contains("edited.csv"));
+}
+
+TEST_F(SettingsTest, FolderChooserStartsAtTheFieldAndFillsIt) {
+    UserMaintainsList();
+    Start();
+    QString prompt, start;
+    QUrl answer = QUrl::fromLocalFile(home.File("chosen"));
+    ScopedFolderDialog dialog([&](QWidget*, const QString& p, const QString& s) {
+        prompt = p;
+        start = s;
+        return answer;
+    });
+    C().Cmd_LocateFolder[1]->click();
+    EXPECT_EQ(prompt, "Choose data folder");
+    EXPECT_EQ(start, home.Path());
+    EXPECT_EQ(C().Txt_LocalFolder[1]->text(), home.File("chosen"));
+    answer = QUrl();
+    C().Cmd_LocateFolder[1]->click();
+    EXPECT_EQ(C().Txt_LocalFolder[1]->text(), home.File("chosen"));
 }
 
 } // namespace
