@@ -3,6 +3,9 @@
 
 #include "window_fixture.h"
 
+#include "support/shell_open.h"
+#include "webdata/talu_web_data.h"
+
 #include <QDir>
 
 namespace quorvel::testing {
@@ -313,6 +316,46 @@ TEST_F(WindowStatesTest, TraceShowsOneLinePerLineOnlyWhileStatusIsTicked) {
     EXPECT_EQ(C().Lbl_status->text(), "Connected to host");
     C().Cmd_Clear->click();
     EXPECT_EQ(C().Lst_Trace->count(), 0);
+}
+
+TEST_F(WindowStatesTest, WebDataEventsReachStatusAndTrace) {
+    Start();
+    C().chk_Log[0]->setChecked(true);
+    Q_EMIT window->WebData().Finished("OK 3 lines");
+    EXPECT_EQ(C().Lbl_status->text(), "OK 3 lines");
+    Q_EMIT window->WebData().ShowStatus("Connecting to host");
+    EXPECT_EQ(C().Lbl_status->text(), "Connecting to host");
+    Q_EMIT window->WebData().ShowLog("D>Connect");
+    Q_EMIT window->WebData().ShowReceived("line 1\nline 2");
+    const QStringList expected = {"Status>OK 3 lines", "Status>Connecting to host", "D>Connect",
+                                  "line 1", "line 2"};
+    ASSERT_EQ(C().Lst_Trace->count(), expected.size());
+    for (int i = 0; i < expected.size(); ++i)
+        EXPECT_EQ(C().Lst_Trace->item(i)->text(), expected[i]);
+}
+
+TEST_F(WindowStatesTest, WebDataWorksWithTheFieldsAsTheyStand) {
+    Start();
+    C().Txt_WebFolder->setText("/clients/wd");
+    EXPECT_NE(window->WebData().WebFolder(), "/clients/wd");
+    window->ConfigureClass();
+    EXPECT_EQ(window->WebData().WebFolder(), "/clients/wd");
+}
+
+TEST_F(WindowStatesTest, EditOpensTheLocalFileOfTheRecord) {
+    UserMaintainsList();
+    WriteList({Line("Rain", "rain.csv")});
+    home.Write("rain.csv", "1,2\r\n");
+    Start();
+    Select(0);
+    QString opened;
+    SetDesktopOpener([&](const QString& file) {
+        opened = file;
+        return true;
+    });
+    C().Cmd_EditFile->click();
+    SetDesktopOpener({});
+    EXPECT_EQ(opened, home.File("rain.csv"));
 }
 
 TEST_F(WindowStatesTest, ErrorReportNamesTheProcedureAndUnlocksTheWindow) {

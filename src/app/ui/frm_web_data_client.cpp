@@ -53,6 +53,10 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
 
 frm_WebDataClient::~frm_WebDataClient() = default;
 
+CTALUWebData& frm_WebDataClient::WebData() {
+    return services_->WebData();
+}
+
 void frm_WebDataClient::ConnectHandlers() {
     ConnectRecordHandlers();
     ConnectWindowHandlers();

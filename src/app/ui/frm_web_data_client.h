@@ -22,6 +22,7 @@ class QMimeData;
 
 namespace quorvel {
 
+class CTALUWebData;
 class WindowServices;
 struct AppSettings;
 
@@ -101,6 +102,9 @@ public:
     LocationFolders Folders() const;
     // The full path of side 0 (this PC) or 1 (the service) of the current record.
     LocationPath FullFilename(int which) const;
+
+    // The web-data object the window owns for the whole run.
+    CTALUWebData& WebData();
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
