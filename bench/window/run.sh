@@ -7,7 +7,7 @@ out=$(mktemp)
 trap 'rm -f "$out"' EXIT
 export QT_QPA_PLATFORM=offscreen
 "$build/bench/window/quorvel_window_bench" --benchmark_out="$out" --benchmark_out_format=json \
-    >/dev/null
+    >/dev/null 2>&1
 /usr/bin/python3 - "$out" <<'PY'
 import json, sys
 runs = {b["name"].split("/")[0]: b for b in json.load(open(sys.argv[1]))["benchmarks"]}
