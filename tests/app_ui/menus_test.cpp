@@ -49,15 +49,6 @@ TEST_F(MenusTest, OpeningAListMovesItToTheTopOfTheRecentList) {
     EXPECT_EQ(window->Recent().Entry(1), home.File("files.txt"));
 }
 
-TEST_F(MenusTest, ListFromAdministratorHidesRecentEntriesAndListCommands) {
-    Start();
-    C().Opt_GetFileList->Button(1)->click();
-    EXPECT_TRUE(VisibleRecent().isEmpty());
-    EXPECT_FALSE(C().mnu_RecentFile[0]->isVisible());
-    EXPECT_FALSE(C().mnu_File[1]->isVisible());
-    EXPECT_TRUE(C().mnu_File[4]->isVisible());
-}
-
 TEST_F(MenusTest, NewEmptiesTheListButKeepsTheRecentList) {
     Start();
     C().mnu_File[0]->trigger();
@@ -93,12 +84,6 @@ TEST_F(MenusTest, CancelledDialogsChangeNothing) {
     EXPECT_EQ(ListNames(), QStringList({"Home list"}));
     EXPECT_EQ(VisibleRecent(), QStringList({home.File("files.txt")}));
     EXPECT_TRUE(ports.prompter.shown.empty());
-}
-
-TEST_F(MenusTest, ExitClosesTheWindow) {
-    Start();
-    C().mnu_File[4]->trigger();
-    EXPECT_FALSE(window->isVisible());
 }
 
 } // namespace

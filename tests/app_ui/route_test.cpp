@@ -51,12 +51,6 @@ TEST_F(RouteTest, DownloadAlwaysDrawsATwoPixelRedLineFromAdminRowToUserRow) {
     EXPECT_TRUE(RowsOf(image, RouteLeft() + 1, kBlue).empty());
 }
 
-TEST_F(RouteTest, DownloadByDateDrawsAOnePixelLine) {
-    C().Opt_Download->Button(kDownloadDate)->click();
-    Pump();
-    EXPECT_EQ(RowsOf(Page(), RouteLeft() + 1, kDarkRed).size(), 1u);
-}
-
 TEST_F(RouteTest, NoTransferDrawsNothing) {
     C().Opt_Download->Button(kDownloadNever)->click();
     Pump();
