@@ -67,10 +67,10 @@ void frm_WebDataClient::mnu_File_Click(int index) {
         const QString chosen = dialogs_.saveFile(this, QStringLiteral("Save file list"),
                                                  files_.LoadedFile, kListFilter);
         if (chosen.isEmpty()) break;
-        AddToRecentFiles(QDir::toNativeSeparators(chosen));
+        const QString path = QDir::toNativeSeparators(chosen);
+        AddToRecentFiles(path);
         // Saving under a chosen name writes the list even when it has not changed.
-        files_.ListChanged = true;
-        SaveFileList();
+        if (const auto error = files_.SaveFileListAs(path, Folders())) ShowError(*error);
         break;
     }
     case 4:
