@@ -34,6 +34,9 @@ TEST_F(MenusTest, OpeningAListMovesItToTheTopOfTheRecentList) {
 
     Open(home.File("second.txt"));
     EXPECT_EQ(ListNames(), QStringList({"Second"}));
+    // The fields of the list that was shown do not leak into the new one.
+    EXPECT_EQ(window->Files().At(0).Name, "Second");
+    EXPECT_EQ(C().Txt_FileName->text(), "s.csv");
     EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("second.txt"));
     Open(home.File("third.txt"));
     EXPECT_EQ(VisibleRecent(), QStringList({home.File("third.txt"), home.File("second.txt"),
