@@ -134,13 +134,15 @@ private:
     void DropConnection();
     // Replies.
     ReplyStream::Next OnLine(QByteArrayView line) override;
+    bool TakesLinesInBulk() const override;
+    qsizetype OnLines(QByteArrayView lines) override;
     void ProcessReply(QByteArrayView line);
     bool ProcessBrowserReplies(QByteArrayView line);
     void ProcessStatusLine(const QString& line);
     void ProcessHeaderLine(QByteArrayView line);
     void ProcessDataLine(QByteArrayView line, bool final, bool ok, QString& message);
     void WriteDataLine(QByteArrayView line);
-    void ShowRecordProgress(QByteArrayView line);
+    void ShowRecordProgress(QByteArrayView line, bool manyLines = false);
     void ProcessLastDate(const QString& value);
     void ProcessUserFolders(QByteArrayView line);
     void EndReplyWithError(const QString& message);

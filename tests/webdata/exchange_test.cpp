@@ -79,6 +79,17 @@ TEST_F(WebDataTest, AReplyWithBareLineFeedsIsReadLikeCrLf) {
     EXPECT_EQ(FileBytes(QStringLiteral("lf.dat")), kTwoRecords);
 }
 
+TEST_F(WebDataTest, PhpNoticesAndEmptyLinesNeverReachTheFile) {
+    const QByteArray body = kRecord1 + "\r\nphp notice: x\r\n" + kRecord2 + "\nPhP Warning\r\n\r\n" +
+                            "ok lower case\r\nOKAY\r\n";
+    QueueNewData("OK 0", {Send(HttpReply(body))});
+    const QString file = home.File(QStringLiteral("php.dat"));
+
+    EXPECT_TRUE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(FileBytes(QStringLiteral("php.dat")), kTwoRecords + "ok lower case\r\n");
+    EXPECT_EQ(finished.last(), QStringLiteral("OKAY"));
+}
+
 TEST_F(WebDataTest, ContinueThenOkIsWaitedThrough) {
     web.EnableLog(3, 1);
     server.Queue("HTTP/1.1 100 Continue\r\n\r\n" + HttpReply("OK 2006-05-02 10:00:00\r\n"));
