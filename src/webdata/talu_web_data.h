@@ -150,6 +150,7 @@ private:
     // Dates.
     bool GetDateFromLine(const QString& line, DateValue& date);
     DateValue GetLastDateInFile(const QString& file);
+    void RefuseUndatedFile();
     // Traces and reports.
     void TraceSent(const QString& text);
     void TraceReceived(const QString& text);
@@ -186,6 +187,7 @@ private:
     QDateTime deadline_;
     DateValue serverLastDate_ = 0;
     DateValue localLastDate_ = 0;
+    bool lastRecordUndated_ = false; // the local file has records but no last date
     DateValue fromDate_ = 0;
     bool doFromDate_ = false;
     ReplyStream stream_;

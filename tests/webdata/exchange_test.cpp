@@ -80,8 +80,8 @@ TEST_F(WebDataTest, AReplyWithBareLineFeedsIsReadLikeCrLf) {
 }
 
 TEST_F(WebDataTest, PhpNoticesAndEmptyLinesNeverReachTheFile) {
-    const QByteArray body = kRecord1 + "\r\nphp notice: x\r\n" + kRecord2 + "\nPhP Warning\r\n\r\n" +
-                            "ok lower case\r\nOKAY\r\n";
+    const QByteArray body = kRecord1 + "\r\nphp notice: x\r\n" + kRecord2 +
+                            "\nPhP Warning\r\n\r\n" + "ok lower case\r\nOKAY\r\n";
     QueueNewData("OK 0", {Send(HttpReply(body))});
     const QString file = home.File(QStringLiteral("php.dat"));
 
@@ -326,6 +326,17 @@ TEST_F(WebDataTest, RecordsJoinAFileWhoseLastLineLacksItsEnd) {
     EXPECT_TRUE(server.requests[1].contains("date=2006-05-01%2010%3A20%3A30 "));
     EXPECT_EQ(FileBytes(QStringLiteral("open.dat")),
               "2006-05-01 10:20:30,1\r\n" + kRecord1 + "\r\n");
+}
+
+TEST_F(WebDataTest, AFileWhoseLastRecordHasNoDateIsNotFetchedAgain) {
+    const QByteArray content = "2006-05-01 10:20:30,1\r\nnot a date,2\r\n";
+    const QString file = home.Write(QStringLiteral("undated.dat"), content);
+    QueueNewData("OK 2006-05-03 00:00:00", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+
+    EXPECT_FALSE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(server.requests.size(), 1);
+    EXPECT_TRUE(web.LastError().startsWith(QStringLiteral("No date in the last record of ")));
+    EXPECT_EQ(FileBytes(QStringLiteral("undated.dat")), content);
 }
 
 TEST_F(WebDataTest, ProgressRunsFromTheLocalToTheServiceDateAndIsClamped) {
