@@ -49,7 +49,11 @@ void BM_GetNewData(benchmark::State& state) {
     state.counters["file_mb"] = static_cast<double>(size) / 1e6;
     state.counters["peak_rss_mb"] = PeakRssMb();
 }
-BENCHMARK(BM_GetNewData)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
+BENCHMARK(BM_GetNewData)
+    ->Unit(benchmark::kMillisecond)
+    ->UseRealTime()
+    ->Iterations(1)
+    ->Repetitions(5);
 
 } // namespace
 

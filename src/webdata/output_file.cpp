@@ -41,8 +41,15 @@ void OutputFile::WriteLine(QByteArrayView line) {
 }
 
 void OutputFile::WriteLines(QByteArrayView lines) {
-    pending_.append(lines.data(), static_cast<std::size_t>(lines.size()));
-    if (pending_.size() >= static_cast<std::size_t>(kGather)) Flush();
+    if (lines.size() < kGather) {
+        pending_.append(lines.data(), static_cast<std::size_t>(lines.size()));
+        if (pending_.size() >= static_cast<std::size_t>(kGather)) Flush();
+        return;
+    }
+    // A long run goes out as it is, after what was gathered before it.
+    Flush();
+    if (file_.write(lines.data(), lines.size()) != lines.size())
+        throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
 }
 
 void OutputFile::Flush() {
@@ -58,6 +65,8 @@ void OutputFile::Close() {
     if (!file_.isOpen()) return;
     try {
         Flush();
+        if (!file_.flush())
+            throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
     } catch (const WebDataError&) {
         file_.close();
         throw;
