@@ -269,6 +269,28 @@ TEST_F(WebDataTest, TheEndOfAChunkedBodyEndsItsLastLine) {
     EXPECT_EQ(FileBytes(QStringLiteral("tail.dat")), kRecord1 + "\r\n");
 }
 
+TEST_F(WebDataTest, EveryArrivalPushesTheTimeOutBack) {
+    const int gap = int(kGap.count());
+    // Together the pauses last longer than the time-out; each alone is well within it.
+    QueueNewData("OK 0", {Send("HTTP/1.1 200 OK\r\n\r\n"), Pause(gap / 2), Send(kRecord1 + "\r\n"),
+                          Pause(gap / 2), Send(kRecord2 + "\r\n"), Pause(gap / 2), Send("OK\r\n")});
+    const QString file = home.File(QStringLiteral("slow.dat"));
+    EXPECT_TRUE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(FileBytes(QStringLiteral("slow.dat")), kTwoRecords);
+}
+
+TEST_F(WebDataTest, AnUnwritableFileIsReportedAndTheCommandFails) {
+    prompter.Script(kAnswerNo);
+    QueueNewData("OK 0", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+    const QString file = home.File(QStringLiteral("no/such/folder/x.dat"));
+
+    EXPECT_FALSE(web.GetNewData(file, 1, 1));
+    ASSERT_EQ(prompter.shown.size(), 1u);
+    EXPECT_TRUE(prompter.shown[0].message.contains(QStringLiteral("TALUWebData:ProcessReply")));
+    EXPECT_EQ(programEnds, 0);
+    EXPECT_FALSE(QFile::exists(file));
+}
+
 TEST_F(WebDataTest, AServerThatNeverAnswersTimesOut) {
     QElapsedTimer timer;
     timer.start();
