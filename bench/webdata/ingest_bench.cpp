@@ -38,7 +38,9 @@ void BM_GetNewData(benchmark::State& state) {
     const QString local = QDir(Env("WD_BENCH_DIR")).filePath(Env("WD_BENCH_FILE"));
     qint64 size = 0;
     for (auto _ : state) {
+        state.PauseTiming();
         QFile::remove(local);
+        state.ResumeTiming();
         if (!web.GetNewData(local, 1, 1)) {
             state.SkipWithError(web.LastError().toStdString().c_str());
             break;
