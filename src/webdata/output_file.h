@@ -7,6 +7,8 @@
 #include <QFile>
 #include <QString>
 
+#include <string>
+
 namespace quorvel {
 
 class OutputFile {
@@ -21,6 +23,8 @@ public:
     void Open(const QString& path, bool& created);
     // Throws WebDataError when the file cannot be written.
     void WriteLine(QByteArrayView line);
+    // Whole lines that already end with CR LF, written as they are.
+    void WriteLines(QByteArrayView lines);
     // Writes what is gathered and closes; throws WebDataError on a write failure.
     void Close();
 
@@ -28,7 +32,7 @@ private:
     void Flush();
 
     QFile file_;
-    QByteArray pending_;
+    std::string pending_; // clear() keeps its capacity, so gathering never reallocates
 };
 
 } // namespace quorvel

@@ -63,6 +63,10 @@ ReplyStream::Outcome ReplyStream::Drain(LineSink& sink) {
         if (chunked_ && !DecodeChunks(bodyEnded)) return Outcome::BadChunking;
         bool restart = false;
         while (!restart) {
+            if (sink.TakesLinesInBulk()) {
+                const qsizetype last = QByteArrayView(text_).sliced(pos_).lastIndexOf('\n');
+                if (last >= 0) pos_ += sink.OnLines(QByteArrayView(text_).sliced(pos_, last + 1));
+            }
             const qsizetype lf = text_.indexOf('\n', pos_);
             if (lf < 0) break;
             const QByteArrayView line = WithoutCr(QByteArrayView(text_).sliced(pos_, lf - pos_));

@@ -22,6 +22,15 @@ public:
         // ChunkedBody: the bytes after this line are a chunked body.
         // Stop: leave the remaining bytes for later.
         virtual Next OnLine(QByteArrayView line) = 0;
+        // Whether OnLines may be offered complete lines in one piece now.
+        virtual bool TakesLinesInBulk() const { return false; }
+        // Takes whole lines, each with its line end, from the front of lines;
+        // returns how many bytes it took (it stops before a line it must see
+        // on its own, which then goes to OnLine).
+        virtual qsizetype OnLines(QByteArrayView lines) {
+            (void)lines;
+            return 0;
+        }
     };
 
     // Longest text kept without a line end.

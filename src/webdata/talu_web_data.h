@@ -134,13 +134,15 @@ private:
     void DropConnection();
     // Replies.
     ReplyStream::Next OnLine(QByteArrayView line) override;
+    bool TakesLinesInBulk() const override;
+    qsizetype OnLines(QByteArrayView lines) override;
     void ProcessReply(QByteArrayView line);
     bool ProcessBrowserReplies(QByteArrayView line);
     void ProcessStatusLine(const QString& line);
     void ProcessHeaderLine(QByteArrayView line);
     void ProcessDataLine(QByteArrayView line, bool final, bool ok, QString& message);
     void WriteDataLine(QByteArrayView line);
-    void ShowRecordProgress(QByteArrayView line);
+    void ShowRecordProgress(QByteArrayView line, bool manyLines = false);
     void ProcessLastDate(const QString& value);
     void ProcessUserFolders(QByteArrayView line);
     void EndReplyWithError(const QString& message);
@@ -148,6 +150,7 @@ private:
     // Dates.
     bool GetDateFromLine(const QString& line, DateValue& date);
     DateValue GetLastDateInFile(const QString& file);
+    void RefuseUndatedFile();
     // Traces and reports.
     void TraceSent(const QString& text);
     void TraceReceived(const QString& text);
@@ -184,6 +187,7 @@ private:
     QDateTime deadline_;
     DateValue serverLastDate_ = 0;
     DateValue localLastDate_ = 0;
+    bool lastRecordUndated_ = false; // the local file has records but no last date
     DateValue fromDate_ = 0;
     bool doFromDate_ = false;
     ReplyStream stream_;

@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstring>
 
 namespace quorvel {
 
@@ -32,6 +33,16 @@ QString TrimSpaces(const QString& text) {
     return text.mid(start, end - start);
 }
 
+template <std::size_t N> bool StartsWith(QByteArrayView line, const char (&prefix)[N]) {
+    return line.size() >= qsizetype(N - 1) && std::memcmp(line.data(), prefix, N - 1) == 0;
+}
+
+QByteArrayView WithoutLineEnd(QByteArrayView line) {
+    if (line.endsWith('\n')) line.chop(1);
+    if (line.endsWith('\r')) line.chop(1);
+    return line;
+}
+
 bool StartsWithPhp(QByteArrayView line) {
     return line.size() >= 3 && (line[0] | 0x20) == 'p' && (line[1] | 0x20) == 'h' &&
            (line[2] | 0x20) == 'p';
@@ -51,14 +62,58 @@ ReplyStream::Next CTALUWebData::OnLine(QByteArrayView line) {
     return ReplyStream::Next::Continue;
 }
 
+// Plain data lines of a GETDATA body go to the open file in runs, as long as
+// nobody asked to see each line.
+bool CTALUWebData::TakesLinesInBulk() const {
+    return httpState_ == 2 && replyKind_ == kDataLines && output_.IsOpen() && !traceServer_ &&
+           !Logging(2) && !Logging(3);
+}
+
+qsizetype CTALUWebData::OnLines(QByteArrayView lines) {
+    const char* const begin = lines.data();
+    const char* const end = begin + lines.size();
+    const char* run = begin; // start of the lines not yet written
+    const char* p = begin;
+    const char* lastLine = nullptr;
+    try {
+        while (p < end) {
+            const qsizetype left = end - p;
+            // Lines that need their own look: empty, final, or "php".
+            if (p[0] == '\n' || (p[0] == '\r' && left > 1 && p[1] == '\n') ||
+                (p[0] == 'O' && left > 1 && p[1] == 'K') ||
+                (p[0] == 'N' && left > 2 && p[1] == 'O' && p[2] == 'K') ||
+                StartsWithPhp(QByteArrayView(p, std::min<qsizetype>(left, 3))))
+                break;
+            const char* lf = static_cast<const char*>(std::memchr(p, '\n', std::size_t(left)));
+            if (lf[-1] != '\r') {
+                // Ended by LF alone: written with CR LF like every record.
+                output_.WriteLines(QByteArrayView(run, p - run));
+                output_.WriteLine(QByteArrayView(p, lf - p));
+                run = lf + 1;
+            }
+            lastLine = p;
+            p = lf + 1;
+        }
+        output_.WriteLines(QByteArrayView(run, p - run));
+        if (lastLine)
+            ShowRecordProgress(WithoutLineEnd(QByteArrayView(lastLine, p - lastLine)), true);
+    } catch (const WebDataError& e) {
+        httpState_ = 0;
+        replyKind_ = kNothing;
+        ErrorReport(QStringLiteral("ProcessReply"), e.Description());
+        return run - begin;
+    }
+    return p - begin;
+}
+
 void CTALUWebData::ProcessReply(QByteArrayView line) {
     try {
         if (Logging(2)) TraceReceived(Text(line));
         if (!ProcessBrowserReplies(line)) return;
         if (Logging(3))
             TraceDebug(QStringLiteral("Processing>") + Text(line) + QStringLiteral("<"));
-        const bool ok = line.startsWith("OK");
-        const bool nok = !ok && line.startsWith("NOK");
+        const bool ok = StartsWith(line, "OK");
+        const bool nok = !ok && StartsWith(line, "NOK");
         const bool final = ok || nok;
         QString message;
         if (ok)
@@ -211,9 +266,9 @@ void CTALUWebData::WriteDataLine(QByteArrayView line) {
                    QStringLiteral("<"));
 }
 
-void CTALUWebData::ShowRecordProgress(QByteArrayView line) {
+void CTALUWebData::ShowRecordProgress(QByteArrayView line, bool manyLines) {
     if (!progress_ || !(serverLastDate_ > localLastDate_)) return;
-    if (recordsSinceProgress_++ % kProgressStride != 0) return;
+    if (!manyLines && recordsSinceProgress_++ % kProgressStride != 0) return;
     const qint64 now = progressClock_.elapsed();
     if (lastProgressMs_ >= 0 && now - lastProgressMs_ < kProgressIntervalMs) return;
     lastProgressMs_ = now;

@@ -61,6 +61,10 @@ bool CTALUWebData::DoCommand(int action) {
                 break;
             case kActionData:
                 localLastDate_ = GetLastDateInFile(localFile_);
+                if (lastRecordUndated_) {
+                    RefuseUndatedFile();
+                    break;
+                }
                 replyKind_ = kDataLines;
                 SendCommand(2, FormatDateIso(localLastDate_));
                 break;
@@ -122,6 +126,15 @@ void CTALUWebData::SendReply(const QString& line) {
     }
 }
 
+// A file that holds records but whose last record has no readable date would
+// be sent date=0, and every record the service has would be appended again.
+void CTALUWebData::RefuseUndatedFile() {
+    lastError_ = QStringLiteral("No date in the last record of ") + localFile_ +
+                 QStringLiteral(", so no data is fetched");
+    ReportAsyncError(lastError_);
+    replyStatus_ = 2;
+}
+
 bool CTALUWebData::GetDateFromLine(const QString& line, DateValue& date) {
     try {
         const LineDate read = DateOfLine(line, dateFormat_);
@@ -140,10 +153,12 @@ bool CTALUWebData::GetDateFromLine(const QString& line, DateValue& date) {
 
 DateValue CTALUWebData::GetLastDateInFile(const QString& file) {
     DateValue result = 0;
+    lastRecordUndated_ = false;
     TraceDebug(QStringLiteral("Finding last date in file: ") + file);
     if (QFileInfo::exists(file)) {
         const std::optional<LastLine> last = ReadLastLine(file);
         if (!last) {
+            lastRecordUndated_ = true;
             ErrorReport(QStringLiteral("GetLastDateInFile: ") + file,
                         QStringLiteral("Path/File access error"));
             return 0;
@@ -151,6 +166,8 @@ DateValue CTALUWebData::GetLastDateInFile(const QString& file) {
         DateValue date = 0;
         if (!last->line.isEmpty() && GetDateFromLine(QString::fromUtf8(last->line), date))
             result = date;
+        lastRecordUndated_ = !last->line.isEmpty() && result == 0 && dateFormat_ >= kDateTime &&
+                             dateFormat_ <= kTeksmart;
     } else {
         TraceDebug(QStringLiteral("File: ") + file +
                    QStringLiteral(" does not exists, so return 0"));

@@ -69,6 +69,9 @@ QByteArray TcpSocketControl::GetData() {
 }
 
 void TcpSocketControl::OnConnected() {
+    // A request goes out line by line; none of them may wait for the peer's
+    // acknowledgement of the one before.
+    socket_.setSocketOption(QAbstractSocket::LowDelayOption, 1);
     Q_EMIT Connected(index_);
 }
 

@@ -79,6 +79,17 @@ TEST_F(WebDataTest, AReplyWithBareLineFeedsIsReadLikeCrLf) {
     EXPECT_EQ(FileBytes(QStringLiteral("lf.dat")), kTwoRecords);
 }
 
+TEST_F(WebDataTest, PhpNoticesAndEmptyLinesNeverReachTheFile) {
+    const QByteArray body = kRecord1 + "\r\nphp notice: x\r\n" + kRecord2 +
+                            "\nPhP Warning\r\n\r\n" + "ok lower case\r\nOKAY\r\n";
+    QueueNewData("OK 0", {Send(HttpReply(body))});
+    const QString file = home.File(QStringLiteral("php.dat"));
+
+    EXPECT_TRUE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(FileBytes(QStringLiteral("php.dat")), kTwoRecords + "ok lower case\r\n");
+    EXPECT_EQ(finished.last(), QStringLiteral("OKAY"));
+}
+
 TEST_F(WebDataTest, ContinueThenOkIsWaitedThrough) {
     web.EnableLog(3, 1);
     server.Queue("HTTP/1.1 100 Continue\r\n\r\n" + HttpReply("OK 2006-05-02 10:00:00\r\n"));
@@ -258,6 +269,28 @@ TEST_F(WebDataTest, TheEndOfAChunkedBodyEndsItsLastLine) {
     EXPECT_EQ(FileBytes(QStringLiteral("tail.dat")), kRecord1 + "\r\n");
 }
 
+TEST_F(WebDataTest, EveryArrivalPushesTheTimeOutBack) {
+    const int gap = int(kGap.count());
+    // Together the pauses last longer than the time-out; each alone is well within it.
+    QueueNewData("OK 0", {Send("HTTP/1.1 200 OK\r\n\r\n"), Pause(gap / 2), Send(kRecord1 + "\r\n"),
+                          Pause(gap / 2), Send(kRecord2 + "\r\n"), Pause(gap / 2), Send("OK\r\n")});
+    const QString file = home.File(QStringLiteral("slow.dat"));
+    EXPECT_TRUE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(FileBytes(QStringLiteral("slow.dat")), kTwoRecords);
+}
+
+TEST_F(WebDataTest, AnUnwritableFileIsReportedAndTheCommandFails) {
+    prompter.Script(kAnswerNo);
+    QueueNewData("OK 0", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+    const QString file = home.File(QStringLiteral("no/such/folder/x.dat"));
+
+    EXPECT_FALSE(web.GetNewData(file, 1, 1));
+    ASSERT_EQ(prompter.shown.size(), 1u);
+    EXPECT_TRUE(prompter.shown[0].message.contains(QStringLiteral("TALUWebData:ProcessReply")));
+    EXPECT_EQ(programEnds, 0);
+    EXPECT_FALSE(QFile::exists(file));
+}
+
 TEST_F(WebDataTest, AServerThatNeverAnswersTimesOut) {
     QElapsedTimer timer;
     timer.start();
@@ -315,6 +348,17 @@ TEST_F(WebDataTest, RecordsJoinAFileWhoseLastLineLacksItsEnd) {
     EXPECT_TRUE(server.requests[1].contains("date=2006-05-01%2010%3A20%3A30 "));
     EXPECT_EQ(FileBytes(QStringLiteral("open.dat")),
               "2006-05-01 10:20:30,1\r\n" + kRecord1 + "\r\n");
+}
+
+TEST_F(WebDataTest, AFileWhoseLastRecordHasNoDateIsNotFetchedAgain) {
+    const QByteArray content = "2006-05-01 10:20:30,1\r\nnot a date,2\r\n";
+    const QString file = home.Write(QStringLiteral("undated.dat"), content);
+    QueueNewData("OK 2006-05-03 00:00:00", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+
+    EXPECT_FALSE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(server.requests.size(), 1);
+    EXPECT_TRUE(web.LastError().startsWith(QStringLiteral("No date in the last record of ")));
+    EXPECT_EQ(FileBytes(QStringLiteral("undated.dat")), content);
 }
 
 TEST_F(WebDataTest, ProgressRunsFromTheLocalToTheServiceDateAndIsClamped) {

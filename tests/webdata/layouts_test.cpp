@@ -118,15 +118,6 @@ TEST_F(Layouts, UnreadableTextsAreLogged) {
     EXPECT_TRUE(text.contains(":Date error:someday"));
 }
 
-TEST_F(Layouts, TheTwoFormats) {
-    EXPECT_EQ(FormatDateLong(0), QStringLiteral("-"));
-    EXPECT_EQ(FormatDateIso(0), QStringLiteral("0"));
-    const DateValue d = MakeDate(2006, 5, 1, 10, 20, 30);
-    EXPECT_EQ(FormatDateLong(d), QStringLiteral("1 May 2006 10:20:30"));
-    EXPECT_EQ(FormatDateIso(d), QStringLiteral("2006-05-01 10:20:30"));
-    EXPECT_EQ(FormatDateIso(-1), QStringLiteral("1899-12-29 00:00:00"));
-}
-
 // Through the object: the last date of a file in each layout.
 class FileDates : public WebDataTest {
 protected:

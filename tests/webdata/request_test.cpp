@@ -44,16 +44,6 @@ TEST(Request, EmptyValuesAreLeftOutButNumbersNever) {
               QStringLiteral("GET http://H/wd/wd.php?cmd=GETDATA&dt=0&filelocation=0 HTTP/1.1"));
 }
 
-TEST(Request, OnlyTheListedCommandsUseGet) {
-    for (int i : {2, 4, 10, 11})
-        EXPECT_TRUE(IsGetCommand(i)) << i;
-    for (int i : {0, 1, 3, 5, 12, 15})
-        EXPECT_FALSE(IsGetCommand(i)) << i;
-    RequestFields f = Fields();
-    f.commandIndex = 1;
-    EXPECT_TRUE(RequestLines(f).first().startsWith(QStringLiteral("POST http://H/wd/wd.php?")));
-}
-
 TEST(Request, ValuesCannotBreakOrExtendTheRequest) {
     RequestFields f = Fields();
     f.password = QStringLiteral("a&b c\r\nX: 1");
@@ -98,13 +88,6 @@ TEST(Request, UrlEncodeEscapesExactlyTheSpecialCharacters) {
     EXPECT_EQ(URLEncode(QStringLiteral("é~_*\r")), QStringLiteral("é~_*\r"));
 }
 
-TEST(Request, MaskHidesOnlyThePassword) {
-    EXPECT_EQ(MaskPassword(
-                  QStringLiteral("GET http://H/wd.php?cmd=X&user=pwd&pwd=a%26b&file=f HTTP/1.1")),
-              QStringLiteral("GET http://H/wd.php?cmd=X&user=pwd&pwd=***&file=f HTTP/1.1"));
-    EXPECT_EQ(MaskPassword(QStringLiteral("Host: H")), QStringLiteral("Host: H"));
-}
-
 TEST(SimpleCipher, KeyIsDoubledPastFiftyCharacters) {
     EXPECT_EQ(ExpandKey(QStringLiteral("583640917")).size(), 72);
     EXPECT_EQ(ExpandKey(QString(51, QLatin1Char('k'))).size(), 51);
@@ -121,12 +104,6 @@ TEST(SimpleCipher, IsItsOwnInverseWithTheDefaultKey) {
     EXPECT_EQ(once->at(6), QLatin1Char(' '));
     EXPECT_EQ(once->at(11), QLatin1Char('-'));
     EXPECT_EQ(EncryptSimple(*once, key), text);
-}
-
-TEST(SimpleCipher, KnownSubstitution) {
-    // "a" is 38; 38 XOR "1" (49) = 23, which maps back to "L" (23 + 53 = 76).
-    // "A" is 6-bit value 12; 12 XOR '5' (53) = 57, which maps back to 't' (57 + 59 = 116).
-    EXPECT_EQ(EncryptSimple(QStringLiteral("A"), QStringLiteral("5")), QStringLiteral("t"));
 }
 
 TEST(SimpleCipher, FailsBeyondTheKeyOnlyForAlphabetCharacters) {

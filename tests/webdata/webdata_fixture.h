@@ -20,7 +20,7 @@ namespace quorvel::testing {
 
 class WebDataTest : public ::testing::Test {
 protected:
-    static constexpr std::chrono::milliseconds kGap{300};
+    static constexpr std::chrono::milliseconds kGap{500};
 
     WebDataTest();
 
