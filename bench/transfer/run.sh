@@ -15,7 +15,7 @@ for r in runs:
     if r.get("error_occurred"):
         sys.exit("transfer bench: %s failed: %s" % (r["run_name"], r.get("error_message")))
     if r.get("aggregate_name") in ("median", "min"):
-        times[(r["run_name"], r["aggregate_name"])] = r["real_time"] / 1000.0
+        times[(r["run_name"].split("/iterations")[0], r["aggregate_name"])] = r["real_time"] / 1000.0
 pairs = [("ftp_download", "ours", "curl"), ("ftp_upload", "ours", "curl"),
          ("zip", "ours", "cli"), ("unzip", "ours", "cli")]
 for name, ours, anchor in pairs:
