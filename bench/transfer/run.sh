@@ -1,12 +1,14 @@
 #!/usr/bin/env bash
 # Runs the transfer benchmarks with their anchors (curl, zip, unzip) and prints
-# the median times and the ratios ours / anchor.
+# the median times and the ratios ours / anchor (also of the best runs). The
+# repetitions of all benchmarks are interleaved, so a busy machine slows ours
+# and the anchors alike.
 set -euo pipefail
 build=$1
 out=$(mktemp)
 trap 'rm -f "$out"' EXIT
 "$build/bench/transfer/transfer_bench" --benchmark_format=json --benchmark_out="$out" \
-    --benchmark_report_aggregates_only=true >/dev/null
+    --benchmark_report_aggregates_only=true --benchmark_enable_random_interleaving=true >/dev/null
 /usr/bin/python3 - "$out" <<'PY'
 import json, sys
 runs = json.load(open(sys.argv[1]))["benchmarks"]
