@@ -7,6 +7,8 @@
 #include <QFileInfo>
 #include <QSaveFile>
 
+#include <algorithm>
+
 namespace quorvel {
 
 namespace {
@@ -35,15 +37,22 @@ size_t WriteToFile(char* data, size_t size, size_t count, void* target) {
     return 0; // curl ends the transfer with a write error
 }
 
+// Sends exactly the size announced at the start, so that a logger appending to
+// the file meanwhile cannot make the upload overrun what curl was told.
 struct ReadSource {
     QFile* file;
     QString* error;
+    qint64 remaining;
 };
 
 size_t ReadFromFile(char* buffer, size_t size, size_t count, void* source) {
     auto* in = static_cast<ReadSource*>(source);
-    const qint64 bytes = in->file->read(buffer, static_cast<qint64>(size * count));
-    if (bytes >= 0) return static_cast<size_t>(bytes);
+    const qint64 wanted = std::min(static_cast<qint64>(size * count), in->remaining);
+    const qint64 bytes = wanted > 0 ? in->file->read(buffer, wanted) : 0;
+    if (bytes >= 0) {
+        in->remaining -= bytes;
+        return static_cast<size_t>(bytes);
+    }
     *in->error = in->file->errorString();
     return CURL_READFUNC_ABORT;
 }
@@ -190,7 +199,7 @@ bool FtpSession::PutOnce(const QString& local, const QString& remote) {
         detail_ = file.errorString();
         return false;
     }
-    ReadSource source{&file, &localError_};
+    ReadSource source{&file, &localError_, file.size()};
     CURL* curl = curl_->get();
     curl_easy_setopt(curl, CURLOPT_NOBODY, 0L);
     curl_easy_setopt(curl, CURLOPT_UPLOAD, 1L);

@@ -158,6 +158,20 @@ TEST_F(FtpSessionTest, UploadThatKeepsFailingIsTriedThreeTimesOnFreshConnections
     EXPECT_EQ(progress.finished, 1);
 }
 
+TEST_F(FtpSessionTest, FileGrowingDuringUploadIsSentAsItWasAtTheStart) {
+    const QByteArray data = RandomBytes(4 << 20);
+    const QString local = home.Write(QStringLiteral("grow.dat"), data);
+    progress.onData = [&] {
+        QFile file(local);
+        if (file.open(QIODevice::Append))
+            file.write(QByteArray(1 << 20, 'n')); // the logger appends meanwhile
+    };
+    EXPECT_TRUE(session.Upload(local, QStringLiteral("grow.dat")))
+        << session.LastError().toStdString();
+    EXPECT_EQ(Read(OnServer(QStringLiteral("grow.dat"))), data);
+    EXPECT_EQ(progress.initialised, 1);
+}
+
 TEST_F(FtpSessionTest, ServerStoppedDuringDownloadLeavesOldCopyAndReconnectsLater) {
     const QByteArray data = RandomBytes(64 << 20);
     Serve(QStringLiteral("big.dat"), data);
