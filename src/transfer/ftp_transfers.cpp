@@ -2,10 +2,10 @@
 #include "transfer/ftp_session.h"
 
 #include "transfer/ftp_status_events.h"
+#include "transfer/replacing_file.h"
 
 #include <QFile>
 #include <QFileInfo>
-#include <QSaveFile>
 
 #include <algorithm>
 
@@ -16,7 +16,7 @@ namespace {
 constexpr int kTries = 3;
 
 struct WriteTarget {
-    QSaveFile* file;
+    ReplacingFile* file;
     QString* error;
 };
 
@@ -31,9 +31,8 @@ void RestoreDiscard(CURL* curl) {
 
 size_t WriteToFile(char* data, size_t size, size_t count, void* target) {
     auto* out = static_cast<WriteTarget*>(target);
-    const qint64 bytes = static_cast<qint64>(size * count);
-    if (out->file->write(data, bytes) == bytes) return size * count;
-    *out->error = out->file->errorString();
+    if (out->file->Write(data, static_cast<qint64>(size * count))) return size * count;
+    *out->error = out->file->ErrorString();
     return 0; // curl ends the transfer with a write error
 }
 
@@ -139,9 +138,9 @@ bool FtpSession::Download(const QString& remote, const QString& local) {
 // Receives into a temporary file beside the target, which replaces the target
 // only once everything arrived: a broken transfer leaves the old copy alone.
 bool FtpSession::GetOnce(const QString& remote, const QString& local) {
-    QSaveFile file(local);
-    if (!file.open(QIODevice::WriteOnly)) {
-        detail_ = file.errorString();
+    ReplacingFile file(local);
+    if (!file.Open()) {
+        detail_ = file.ErrorString();
         return false;
     }
     WriteTarget target{&file, &localError_};
@@ -153,8 +152,8 @@ bool FtpSession::GetOnce(const QString& remote, const QString& local) {
     const bool received = Perform(remote);
     if (curl_) RestoreDiscard(curl_->get());
     if (!received) return false; // the temporary file goes with `file`
-    if (!file.commit()) {
-        detail_ = file.errorString();
+    if (!file.Commit()) {
+        detail_ = file.ErrorString();
         return false;
     }
     TransferDone();

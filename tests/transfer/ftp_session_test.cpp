@@ -86,10 +86,14 @@ TEST_F(FtpSessionTest, UploadAndDownloadKeepEveryByteOverOneConnection) {
     EXPECT_EQ(Read(OnServer(QStringLiteral("site1.dat"))), data);
     EXPECT_EQ(progress.total, data.size());
 
-    const QString back = home.File(QStringLiteral("data/back.dat"));
+    const QString back = home.Write(QStringLiteral("data/back.dat"), "older copy");
+    const auto ownerOnly =
+        QFile::ReadOwner | QFile::WriteOwner | QFile::ReadUser | QFile::WriteUser;
+    QFile::setPermissions(back, ownerOnly);
     ASSERT_TRUE(session.Download(QStringLiteral("site1.dat"), back))
         << session.LastError().toStdString();
     EXPECT_EQ(Read(back), data);
+    EXPECT_EQ(QFile::permissions(back), ownerOnly);
     EXPECT_EQ(progress.total, data.size());
     EXPECT_EQ(progress.style, 3);
     EXPECT_EQ(progress.units, QStringLiteral("bytes"));
