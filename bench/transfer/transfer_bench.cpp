@@ -145,10 +145,7 @@ void Register(const char* name, void (*function)(benchmark::State&), int repetit
         ->Unit(benchmark::kMillisecond)
         ->UseRealTime()
         ->Iterations(1)
-        ->Repetitions(repetitions)
-        ->ComputeStatistics("min", [](const std::vector<double>& v) {
-            return *std::min_element(v.begin(), v.end());
-        });
+        ->Repetitions(repetitions);
 }
 
 } // namespace
