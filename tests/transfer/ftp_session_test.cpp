@@ -137,6 +137,7 @@ TEST_F(FtpSessionTest, UploadOfMissingLocalFileOpensNoConnection) {
 }
 
 TEST_F(FtpSessionTest, WrongPasswordIsReportedAsFailedAccess) {
+    ASSERT_TRUE(session.Open()); // changed details drop this connection
     session.SetDetails(peer.Server(), QStringLiteral("logger"), QStringLiteral("wrong"), true);
     const QString local = home.Write(QStringLiteral("site3.dat"), "old copy");
     EXPECT_FALSE(session.Download(QStringLiteral("site3.dat"), local));
