@@ -48,10 +48,18 @@ void FtpSession::SetDisplay(TraceView* trace, ProgressView* progress) {
 
 void FtpSession::SetDetails(const QString& server, const QString& user, const QString& password,
                             bool trace) {
+    const bool changed = server != server_ || user != user_ || password != password_;
     server_ = server;
     user_ = user;
     password_ = password;
     report_.SetTracing(trace);
+    // A connection made with other details must not serve the next transfer.
+    if (changed && ids_.internet != 0) {
+        if (depth_ == 0)
+            DoClose();
+        else
+            closeRequested_ = true;
+    }
 }
 
 void FtpSession::ClearError() {
@@ -102,7 +110,6 @@ void FtpSession::Close() {
 bool FtpSession::DoOpen() {
     if (IsOpen() && !events_.ConnectionLost()) return true;
     DoClose();
-    userAgent_ = QStringLiteral("TALUWebdData");
     BusyGuard busy(CurrentBusyPointer());
     report_.Status(QStringLiteral("Connecting to internet..."));
     if (!CreateHandle()) {
@@ -202,7 +209,8 @@ bool FtpSession::HttpGetFileContents(const QString& url, QString& contents) {
     ClearError();
     BusyGuard busy(CurrentBusyPointer());
     const bool ok = Guarded(QStringLiteral("HTTPGetFileContents: ") + url, [&] {
-        const HttpFetchOutcome outcome = FetchHttpText(url, userAgent_, report_, contents);
+        const HttpFetchOutcome outcome =
+            FetchHttpText(url, QStringLiteral("TALUWebdData"), report_, contents);
         lastError_ = outcome.error;
         detail_ = outcome.detail;
         return outcome.ok;

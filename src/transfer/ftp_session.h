@@ -107,7 +107,6 @@ private:
     long connectionsMade_ = 0;
 
     QString server_, user_, password_;
-    QString userAgent_;
     QString lastError_;
     QString detail_;
     QString localError_;

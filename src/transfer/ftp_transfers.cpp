@@ -2,10 +2,12 @@
 #include "transfer/ftp_session.h"
 
 #include "transfer/ftp_status_events.h"
+#include "transfer/replacing_file.h"
 
 #include <QFile>
 #include <QFileInfo>
-#include <QSaveFile>
+
+#include <algorithm>
 
 namespace quorvel {
 
@@ -14,7 +16,7 @@ namespace {
 constexpr int kTries = 3;
 
 struct WriteTarget {
-    QSaveFile* file;
+    ReplacingFile* file;
     QString* error;
 };
 
@@ -29,21 +31,27 @@ void RestoreDiscard(CURL* curl) {
 
 size_t WriteToFile(char* data, size_t size, size_t count, void* target) {
     auto* out = static_cast<WriteTarget*>(target);
-    const qint64 bytes = static_cast<qint64>(size * count);
-    if (out->file->write(data, bytes) == bytes) return size * count;
-    *out->error = out->file->errorString();
+    if (out->file->Write(data, static_cast<qint64>(size * count))) return size * count;
+    *out->error = out->file->ErrorString();
     return 0; // curl ends the transfer with a write error
 }
 
+// Sends exactly the size announced at the start, so that a logger appending to
+// the file meanwhile cannot make the upload overrun what curl was told.
 struct ReadSource {
     QFile* file;
     QString* error;
+    qint64 remaining;
 };
 
 size_t ReadFromFile(char* buffer, size_t size, size_t count, void* source) {
     auto* in = static_cast<ReadSource*>(source);
-    const qint64 bytes = in->file->read(buffer, static_cast<qint64>(size * count));
-    if (bytes >= 0) return static_cast<size_t>(bytes);
+    const qint64 wanted = std::min(static_cast<qint64>(size * count), in->remaining);
+    const qint64 bytes = wanted > 0 ? in->file->read(buffer, wanted) : 0;
+    if (bytes >= 0) {
+        in->remaining -= bytes;
+        return static_cast<size_t>(bytes);
+    }
     *in->error = in->file->errorString();
     return CURL_READFUNC_ABORT;
 }
@@ -130,9 +138,9 @@ bool FtpSession::Download(const QString& remote, const QString& local) {
 // Receives into a temporary file beside the target, which replaces the target
 // only once everything arrived: a broken transfer leaves the old copy alone.
 bool FtpSession::GetOnce(const QString& remote, const QString& local) {
-    QSaveFile file(local);
-    if (!file.open(QIODevice::WriteOnly)) {
-        detail_ = file.errorString();
+    ReplacingFile file(local);
+    if (!file.Open()) {
+        detail_ = file.ErrorString();
         return false;
     }
     WriteTarget target{&file, &localError_};
@@ -144,8 +152,8 @@ bool FtpSession::GetOnce(const QString& remote, const QString& local) {
     const bool received = Perform(remote);
     if (curl_) RestoreDiscard(curl_->get());
     if (!received) return false; // the temporary file goes with `file`
-    if (!file.commit()) {
-        detail_ = file.errorString();
+    if (!file.Commit()) {
+        detail_ = file.ErrorString();
         return false;
     }
     TransferDone();
@@ -190,7 +198,7 @@ bool FtpSession::PutOnce(const QString& local, const QString& remote) {
         detail_ = file.errorString();
         return false;
     }
-    ReadSource source{&file, &localError_};
+    ReadSource source{&file, &localError_, file.size()};
     CURL* curl = curl_->get();
     curl_easy_setopt(curl, CURLOPT_NOBODY, 0L);
     curl_easy_setopt(curl, CURLOPT_UPLOAD, 1L);

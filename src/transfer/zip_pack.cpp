@@ -78,10 +78,14 @@ int AddFile(zip_t* archive, const QFileInfo& file) {
     zip_source_t* source = zip_source_file(archive, path.constData(), 0, -1);
     if (source == nullptr) return CodeOf(zip_get_error(archive));
     const QByteArray entry = file.fileName().toUtf8();
-    if (zip_file_add(archive, entry.constData(), source, ZIP_FL_ENC_UTF_8) < 0) {
+    const zip_int64_t index = zip_file_add(archive, entry.constData(), source, ZIP_FL_ENC_UTF_8);
+    if (index < 0) {
         zip_source_free(source);
         return CodeOf(zip_get_error(archive));
     }
+    // libzip's own default is the slowest level; 6 is what zip tools use.
+    if (zip_set_file_compression(archive, static_cast<zip_uint64_t>(index), ZIP_CM_DEFLATE, 6) < 0)
+        return CodeOf(zip_get_error(archive));
     return kZipOk;
 }
 

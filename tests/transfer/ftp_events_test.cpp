@@ -42,26 +42,5 @@ TEST_F(FtpEventsTest, ProgressBeyondTheTotalHasNoPercentage) {
     EXPECT_EQ(PercentText(25, 100), QStringLiteral("25%"));
 }
 
-TEST_F(FtpEventsTest, HandleClosingEndsTheTransferOnce) {
-    report.ProgressStart(TransferState::Upload, 10, QStringLiteral("a=>b"));
-    HandleFtpStatus(report, 30, QString(), 10);
-    EXPECT_TRUE(view.traces.last().contains(QStringLiteral(":Uploading 10/10 ")));
-    HandleFtpStatus(report, 70, QString(), 0);
-    EXPECT_EQ(view.statuses.last(), QStringLiteral("Upload complete"));
-    EXPECT_EQ(report.Counters().state, TransferState::None);
-    HandleFtpStatus(report, 70, QString(), 0);
-    EXPECT_TRUE(view.traces.last().contains(QStringLiteral(":Handle closed - unknown state ")));
-}
-
-TEST_F(FtpEventsTest, LostConnectionAsksForAClose) {
-    EXPECT_EQ(HandleFtpStatus(report, 51, QString(), 0), FtpFollowUp::CloseConnection);
-    EXPECT_EQ(view.statuses.last(), QStringLiteral("Connection closed (call ftpClose)"));
-    EXPECT_EQ(HandleFtpStatus(report, 200, QString(), 2), FtpFollowUp::CloseConnection);
-    EXPECT_EQ(HandleFtpStatus(report, 200, QString(), 16), FtpFollowUp::None);
-    EXPECT_EQ(HandleFtpStatus(report, 77, QString(), 0), FtpFollowUp::None);
-    EXPECT_TRUE(view.traces.last().contains(
-        QStringLiteral(":CallStatusFTP, but unknown al_InternetStatus= 77 ")));
-}
-
 } // namespace
 } // namespace quorvel

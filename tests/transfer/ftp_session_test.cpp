@@ -3,7 +3,7 @@
 #include "common/temp_home.h"
 #include "peer_process.h"
 #include "support/program_home.h"
-#include "transfer/ftp.h"
+#include "transfer/ftp_session.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -59,6 +59,11 @@ protected:
         session.SetDetails(peer.Server(), QStringLiteral("logger"), QStringLiteral("secret"), true);
     }
     QString OnServer(const QString& name) const { return root.filePath(name); }
+    void Serve(const QString& name, const QByteArray& bytes) {
+        QFile file(OnServer(name));
+        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
+        file.write(bytes);
+    }
     static QByteArray Read(const QString& path) {
         QFile file(path);
         return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<missing>");
@@ -81,10 +86,14 @@ TEST_F(FtpSessionTest, UploadAndDownloadKeepEveryByteOverOneConnection) {
     EXPECT_EQ(Read(OnServer(QStringLiteral("site1.dat"))), data);
     EXPECT_EQ(progress.total, data.size());
 
-    const QString back = home.File(QStringLiteral("data/back.dat"));
+    const QString back = home.Write(QStringLiteral("data/back.dat"), "older copy");
+    const auto ownerOnly =
+        QFile::ReadOwner | QFile::WriteOwner | QFile::ReadUser | QFile::WriteUser;
+    QFile::setPermissions(back, ownerOnly);
     ASSERT_TRUE(session.Download(QStringLiteral("site1.dat"), back))
         << session.LastError().toStdString();
     EXPECT_EQ(Read(back), data);
+    EXPECT_EQ(QFile::permissions(back), ownerOnly);
     EXPECT_EQ(progress.total, data.size());
     EXPECT_EQ(progress.style, 3);
     EXPECT_EQ(progress.units, QStringLiteral("bytes"));
@@ -128,6 +137,7 @@ TEST_F(FtpSessionTest, UploadOfMissingLocalFileOpensNoConnection) {
 }
 
 TEST_F(FtpSessionTest, WrongPasswordIsReportedAsFailedAccess) {
+    ASSERT_TRUE(session.Open()); // changed details drop this connection
     session.SetDetails(peer.Server(), QStringLiteral("logger"), QStringLiteral("wrong"), true);
     const QString local = home.Write(QStringLiteral("site3.dat"), "old copy");
     EXPECT_FALSE(session.Download(QStringLiteral("site3.dat"), local));
@@ -153,12 +163,23 @@ TEST_F(FtpSessionTest, UploadThatKeepsFailingIsTriedThreeTimesOnFreshConnections
     EXPECT_EQ(progress.finished, 1);
 }
 
+TEST_F(FtpSessionTest, FileGrowingDuringUploadIsSentAsItWasAtTheStart) {
+    const QByteArray data = RandomBytes(4 << 20);
+    const QString local = home.Write(QStringLiteral("grow.dat"), data);
+    progress.onData = [&] {
+        QFile file(local);
+        if (file.open(QIODevice::Append))
+            file.write(QByteArray(1 << 20, 'n')); // the logger appends meanwhile
+    };
+    EXPECT_TRUE(session.Upload(local, QStringLiteral("grow.dat")))
+        << session.LastError().toStdString();
+    EXPECT_EQ(Read(OnServer(QStringLiteral("grow.dat"))), data);
+    EXPECT_EQ(progress.initialised, 1);
+}
+
 TEST_F(FtpSessionTest, ServerStoppedDuringDownloadLeavesOldCopyAndReconnectsLater) {
     const QByteArray data = RandomBytes(64 << 20);
-    QFile served(OnServer(QStringLiteral("big.dat")));
-    ASSERT_TRUE(served.open(QIODevice::WriteOnly));
-    served.write(data);
-    served.close();
+    Serve(QStringLiteral("big.dat"), data);
     const QString local = home.Write(QStringLiteral("in/big.dat"), "old copy");
     progress.onData = [this] { peer.Stop(); };
 
@@ -198,10 +219,7 @@ private:
 };
 
 TEST_F(FtpSessionTest, FullDiskDuringDownloadLeavesOldCopy) {
-    QFile served(OnServer(QStringLiteral("full.dat")));
-    ASSERT_TRUE(served.open(QIODevice::WriteOnly));
-    served.write(RandomBytes(8 << 20));
-    served.close();
+    Serve(QStringLiteral("full.dat"), RandomBytes(8 << 20));
     const QString local = home.Write(QStringLiteral("disk/full.dat"), "old copy");
     {
         FileSizeLimit limit(1 << 20);
@@ -248,10 +266,7 @@ TEST_F(FtpSessionTest, OpenConnectionIsReusedAndTracesNameIt) {
 }
 
 TEST_F(FtpSessionTest, WindowEventsRunDuringTransferAndMayCloseIt) {
-    QFile served(OnServer(QStringLiteral("mid.dat")));
-    ASSERT_TRUE(served.open(QIODevice::WriteOnly));
-    served.write(RandomBytes(32 << 20));
-    served.close();
+    Serve(QStringLiteral("mid.dat"), RandomBytes(32 << 20));
     const QString local = home.Write(QStringLiteral("mid.dat"), "old copy");
     bool ranDuringTransfer = false;
     bool nestedRefused = false;
@@ -279,20 +294,6 @@ TEST_F(FtpSessionTest, UnwritableTransferLogIsReportedAndTransferStillCounts) {
     EXPECT_TRUE(ports.prompter.shown[0].message.endsWith(QStringLiteral("\r\n") +
                                                          ProgramHome::FtpLogFile()));
     EXPECT_TRUE(ports.prompter.shown[0].timed);
-}
-
-TEST_F(FtpSessionTest, FacadeDrivesTheProcessSession) {
-    SetFTPDisplay(&view, nullptr);
-    SetFTPDetails(peer.Server(), QStringLiteral("logger"), QStringLiteral("secret"), false);
-    const QString local = home.Write(QStringLiteral("site6.dat"), "six");
-    EXPECT_TRUE(ftpUploadFile(local, QStringLiteral("site6.dat")));
-    EXPECT_TRUE(ftpRemoteFileExists(QStringLiteral("site6.dat")));
-    EXPECT_FALSE(ftpDownLoadFile(QStringLiteral("none.dat"), local));
-    EXPECT_EQ(ftpLastError(), QStringLiteral("Downloading, but none.dat does not exist"));
-    EXPECT_TRUE(view.traces.isEmpty()); // tracing off
-    ftpClose();
-    EXPECT_FALSE(ProcessFtpSession().IsOpen());
-    SetFTPDisplay(nullptr, nullptr);
 }
 
 } // namespace
