@@ -276,6 +276,20 @@ TEST_F(WindowStatesTest, ErrorReportNamesTheProcedureAndUnlocksTheWindow) {
     EXPECT_TRUE(window->Flags().InMessage);
 }
 
+TEST_F(WindowStatesTest, LongPathsDoNotWidenTheWindow) {
+    UserMaintainsList();
+    WriteList({Line("Deep", QString(300, 'x') + ".csv")});
+    Start();
+    Select(-1);
+    const int before = window->minimumSizeHint().width();
+    C().Txt_LocalFolder[1]->setText("/" + QString(400, 'd'));
+    Select(0);
+    window->ShowStatus("Failed: " + QString(400, 'e'));
+    Pump();
+    EXPECT_EQ(window->minimumSizeHint().width(), before);
+    EXPECT_TRUE(C().lbl_UserLocationFolder[1]->toolTip().endsWith("ddd"));
+}
+
 TEST_F(WindowStatesTest, TracePaneTakesTheRoomOfAGrowingWindow) {
     Start();
     window->resize(1000, 800);

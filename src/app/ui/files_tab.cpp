@@ -145,7 +145,7 @@ QLayout* BuildLocationRow(WindowControls& c, QWidget* page) {
     }
     for (int i = 0; i < 4; ++i) {
         c.lbl_UserLocationFolder[i] =
-            MakeLabel(QString(), c.Frame_UserLocationID, Indexed("lbl_UserLocationFolder", i));
+            MakePathLabel(Indexed("lbl_UserLocationFolder", i), c.Frame_UserLocationID);
         c.lbl_UserLocationFolder[i]->setMinimumWidth(120);
         user->addWidget(c.lbl_UserLocationFolder[i], i, 1);
     }
@@ -166,7 +166,7 @@ QLayout* BuildFileStatusRows(WindowControls& c, QWidget* page) {
     const char* sides[] = {"This PC:", "Web site:"};
     for (int i = 0; i < 2; ++i) {
         grid->addWidget(MakeLabel(QLatin1String(sides[i]), page), i, 0);
-        c.Lbl_FullFilename[i] = MakeLabel(QString(), page, Indexed("Lbl_FullFilename", i));
+        c.Lbl_FullFilename[i] = MakePathLabel(Indexed("Lbl_FullFilename", i), page);
         c.Lbl_FullFilename[i]->setTextInteractionFlags(Qt::TextSelectableByMouse);
         c.Lbl_FullFilename[i]->setMinimumWidth(200);
         c.Lbl_FileStatus[i] = MakeLabel(QString(), page, Indexed("Lbl_FileStatus", i));

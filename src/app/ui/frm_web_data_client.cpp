@@ -66,6 +66,7 @@ void frm_WebDataClient::ConnectHandlers() {
 void frm_WebDataClient::SetLoadedFile(const QString& path) {
     files_.LoadedFile = path;
     c_.Lbl_LoadedFile->setText(path);
+    c_.Lbl_LoadedFile->setToolTip(path);
 }
 
 const FileRecord& frm_WebDataClient::RecordAt(int number) const {

@@ -21,6 +21,13 @@ QLabel* MakeLabel(const QString& caption, QWidget* parent, const QString& name) 
     return label;
 }
 
+QLabel* MakePathLabel(const QString& name, QWidget* parent) {
+    auto* label = MakeLabel(QString(), parent, name);
+    label->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+    label->setMinimumWidth(60);
+    return label;
+}
+
 QLineEdit* MakeEdit(const QString& name, QWidget* parent) {
     auto* edit = new QLineEdit(parent);
     edit->setObjectName(name);
@@ -166,7 +173,7 @@ void BuildWindowControls(QMainWindow* window, WindowControls& c) {
     root->addLayout(top, 0);
 
     root->addLayout(BuildRunRow(c, central));
-    c.Lbl_status = MakeLabel(QString(), central, QStringLiteral("Lbl_status"));
+    c.Lbl_status = MakePathLabel(QStringLiteral("Lbl_status"), central);
     c.Lbl_status->setAutoFillBackground(true);
     c.Lbl_status->setFrameShape(QFrame::Panel);
     c.Lbl_status->setFrameShadow(QFrame::Sunken);

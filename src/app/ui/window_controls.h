@@ -138,6 +138,9 @@ QWidget* BuildOptionsTab(WindowControls& c);
 
 // Small makers that give each control its described name.
 QLabel* MakeLabel(const QString& caption, QWidget* parent, const QString& name = {});
+// A label for paths and messages of any length: it takes the room the layout
+// gives it and never widens the window.
+QLabel* MakePathLabel(const QString& name, QWidget* parent);
 QLineEdit* MakeEdit(const QString& name, QWidget* parent);
 QPushButton* MakeButton(const QString& name, const QString& caption, QWidget* parent);
 QCheckBox* MakeCheck(const QString& name, const QString& caption, QWidget* parent);

@@ -57,8 +57,10 @@ void frm_WebDataClient::EnableControls() {
         w->setVisible(support);
 
     const LocationFolders folders = Folders();
-    for (int i = 0; i < 4; ++i)
+    for (int i = 0; i < 4; ++i) {
         c_.lbl_UserLocationFolder[i]->setText(GetLocationFolder(folders, i, kOnThisPc));
+        c_.lbl_UserLocationFolder[i]->setToolTip(c_.lbl_UserLocationFolder[i]->text());
+    }
     PlotRouteLines();
     ConfigureClass();
     ShowFileStatus(sel);

@@ -115,7 +115,7 @@ QWidget* BuildFoldersTab(WindowControls& c) {
     c.Txt_UserCurrentFolder = AddEditRow(grid, 3, QStringLiteral("User current folder:"),
                                          QStringLiteral("Txt_UserCurrentFolder"), page);
     grid->addWidget(MakeLabel(QStringLiteral("User folder on web site:"), page), 4, 0);
-    c.Lbl_UserFolder = MakeLabel(QString(), page, QStringLiteral("Lbl_UserFolder"));
+    c.Lbl_UserFolder = MakePathLabel(QStringLiteral("Lbl_UserFolder"), page);
     grid->addWidget(c.Lbl_UserFolder, 4, 1);
     grid->setColumnStretch(1, 1);
     layout->addLayout(grid);
@@ -160,7 +160,7 @@ QWidget* BuildNewSeasonTab(WindowControls& c) {
     layout->addLayout(grid);
     auto* loaded = new QHBoxLayout;
     loaded->addWidget(MakeLabel(QStringLiteral("File:"), page));
-    c.Lbl_LoadedFile = MakeLabel(QString(), page, QStringLiteral("Lbl_LoadedFile"));
+    c.Lbl_LoadedFile = MakePathLabel(QStringLiteral("Lbl_LoadedFile"), page);
     c.Lbl_LoadedFile->setTextInteractionFlags(Qt::TextSelectableByMouse);
     loaded->addWidget(c.Lbl_LoadedFile, 1);
     layout->addLayout(loaded);
