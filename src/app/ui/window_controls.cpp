@@ -131,7 +131,8 @@ void BuildMenus(QMainWindow* window, WindowControls& c) {
     file->setObjectName(QStringLiteral("mnu_FileMenu"));
     const char* captions[] = {"&New...", "&Open...", "&Save...", "-", "E&xit"};
     for (int i = 0; i < 5; ++i) {
-        auto* action = new QAction(QLatin1String(captions[i]), window);
+        // The separator is drawn as a line; its "-" caption would show beside it.
+        auto* action = new QAction(i == 3 ? QString() : QLatin1String(captions[i]), window);
         action->setSeparator(i == 3);
         action->setObjectName(Indexed("mnu_File", i));
         file->addAction(action);
