@@ -1,0 +1,134 @@
+#include "app/app_settings.h"
+
+#include "app/file_list_format.h"
+#include "support/ini_store.h"
+#include "support/paths.h"
+#include "support/ports.h"
+#include "support/program_home.h"
+#include "support/value_rules.h"
+
+namespace quorvel {
+
+namespace {
+
+constexpr const char* kDefaultListName = "files.txt";
+
+std::int16_t CheckValue(const QString& text) {
+    return IsNonZero(text) ? 1 : 0;
+}
+
+// Reads the settings in start-up order; an option index that is no 16-bit
+// number stops the reading.
+class SettingsReader {
+public:
+    explicit SettingsReader(const LocalSettings& settings) : settings_(settings) {}
+
+    QString Text(const char* key, const QString& fallback) const {
+        return settings_.GetLocalSetting(QString::fromLatin1(key), fallback);
+    }
+
+    bool OptionIndex(const char* key, const char* fallback, std::int16_t& target) {
+        const QString text = Text(key, QString::fromLatin1(fallback));
+        const auto index = ToInt16(text);
+        if (!index) {
+            error_ = AppError{IsNumericText(text) ? QStringLiteral("Overflow")
+                                                  : QStringLiteral("Type mismatch"),
+                              QStringLiteral("Load")};
+            return false;
+        }
+        target = *index;
+        return true;
+    }
+
+    const std::optional<AppError>& Error() const { return error_; }
+
+private:
+    const LocalSettings& settings_;
+    std::optional<AppError> error_;
+};
+
+} // namespace
+
+QString DefaultAfterDate(int year) {
+    return QStringLiteral("1 Nov ") + QString::number(year);
+}
+
+QString SingleText(float value) {
+    return QString::number(static_cast<double>(value), 'g', 7).toUpper();
+}
+
+AppSettings AppSettings::Defaults(const QString& programFolder, int currentYear) {
+    AppSettings s;
+    s.applicationFolder = programFolder;
+    s.dataFolder = programFolder;
+    s.interval = QStringLiteral("3 hrs");
+    s.lastDownload = QStringLiteral("never");
+    s.afterDate = DefaultAfterDate(currentYear);
+    s.loadedFile = AddTrailingSlash(programFolder) + kDefaultListName;
+    s.recentFiles.SetEntry(1, s.loadedFile);
+    return s;
+}
+
+std::optional<AppError> AppSettings::Load(const LocalSettings& settings,
+                                          const QString& programFolder, int currentYear) {
+    SettingsReader in(settings);
+    cfgUrl = in.Text("CFG_URL", {});
+    userId = in.Text("UserID", {});
+    password = in.Text("Password", {});
+    applicationFolder = in.Text("ApplicationFolder", programFolder);
+    dataFolder = in.Text("DataFolder", programFolder);
+    showDate0 = CheckValue(in.Text("ShowDate0", QStringLiteral("1")));
+    if (!in.OptionIndex("GetLocalFolders", "1", getLocalFolders) ||
+        !in.OptionIndex("GetFileList", "1", getFileList) ||
+        !in.OptionIndex("Automatic", "0", automatic)) {
+        return in.Error();
+    }
+    interval = in.Text("Interval", QStringLiteral("3 hrs"));
+    lastDownload = in.Text("LastDownload", QStringLiteral("never"));
+    nextDownloadDue = in.Text("NextDownloadDue", {});
+    downloadOnly = CheckValue(in.Text("DownloadOnly", QStringLiteral("0")));
+    if (!in.OptionIndex("Whichdates", "0", whichdates)) return in.Error();
+    afterDate = in.Text("AfterDate", DefaultAfterDate(currentYear));
+    for (int number = 1; number <= RecentFiles::kEntries; ++number) {
+        const QByteArray key = "File" + QByteArray::number(number);
+        recentFiles.SetEntry(number, in.Text(key.constData(), {}));
+    }
+    loadedFile = in.Text("File1", AddTrailingSlash(applicationFolder) + kDefaultListName);
+    recentFiles.SetEntry(1, loadedFile);
+    return std::nullopt;
+}
+
+std::optional<AppError> AppSettings::Load(const LocalSettings& settings) {
+    return Load(settings, ProgramHome::Folder(), CurrentClock().Now().date().year());
+}
+
+bool AppSettings::Save(LocalSettings& settings) const {
+    const auto number = [](std::int16_t value) { return QString::number(value); };
+    const std::pair<const char*, QString> values[] = {
+        {"Left", SingleText(left)},
+        {"Top", SingleText(top)},
+        {"CFG_URL", cfgUrl},
+        {"UserID", userId},
+        {"Password", password},
+        {"ApplicationFolder", applicationFolder},
+        {"DataFolder", dataFolder},
+        {"Automatic", number(automatic)},
+        {"Interval", interval},
+        {"LastDownload", lastDownload},
+        {"NextDownloadDue", nextDownloadDue},
+        {"Whichdates", number(whichdates)},
+        {"AfterDate", afterDate},
+        {"ShowDate0", number(showDate0)},
+        {"ShowDate1", number(showDate1)},
+        {"GetFileList", number(getFileList)},
+        {"GetLocalFolders", number(getLocalFolders)},
+        {"DownloadOnly", number(downloadOnly)},
+    };
+    bool ok = true;
+    for (const auto& [key, value] : values) {
+        ok = settings.SaveLocalSetting(QString::fromLatin1(key), value) && ok;
+    }
+    return ok;
+}
+
+} // namespace quorvel

@@ -1,0 +1,168 @@
+// Opening and reusing the connection, waiting for a reply, the socket's events.
+#include "webdata/talu_web_data.h"
+
+#include "webdata/request.h"
+#include "webdata/webdata_error.h"
+
+#include <QCoreApplication>
+#include <QMetaMethod>
+#include <QTimer>
+
+namespace quorvel {
+
+namespace {
+// While waiting, the event loop hands control back at least this often so the
+// clock and the cancel flag are looked at.
+constexpr int kTickMs = 20;
+} // namespace
+
+QDateTime CTALUWebData::Now() const {
+    return CurrentClock().Now();
+}
+
+QDateTime CTALUWebData::NextDeadline() const {
+    return Now().addMSecs(CurrentClock().Waits().replyGap.count());
+}
+
+void CTALUWebData::PumpOnce() {
+    QCoreApplication::processEvents(QEventLoop::AllEvents | QEventLoop::WaitForMoreEvents);
+}
+
+bool CTALUWebData::OpenConnection() {
+    try {
+        if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
+        // A close the service sent after its last reply must be seen before the
+        // connection is trusted again.
+        QCoreApplication::processEvents();
+        if (socket_ && socket_->State() != kSocketConnected) {
+            socket_->Close();
+            stream_.Clear();
+            const HostPort target = SplitHostPort(remoteHost_, remotePort_);
+            socket_->SetRemotePort(target.port);
+            socket_->SetRemoteHost(target.host);
+            socket_->Connect();
+            ShowStatusText(QStringLiteral("Connecting to ") + remoteHost_);
+            const QDateTime giveUp = NextDeadline();
+            QTimer tick;
+            tick.start(kTickMs);
+            while (socket_ && socket_->State() != kSocketConnected) {
+                PumpOnce();
+                if (socket_ && socket_->State() == kSocketError) return false;
+                if (userCancel_ || Now() > giveUp) break;
+            }
+            if (socket_)
+                TraceDebug(QStringLiteral("Connected Winsock State:") +
+                           WinsockStatus(socket_->State()));
+        }
+        if (socket_ && socket_->State() == kSocketConnected) {
+            ShowStatusText(QStringLiteral("Connected to ") + remoteHost_);
+            return true;
+        }
+        ShowStatusText(QStringLiteral("*Not* connected to ") + remoteHost_);
+        return false;
+    } catch (const WebDataError& e) {
+        if (socket_) socket_->Close();
+        ErrorReport(QStringLiteral("Connect"), e.Description());
+        return false;
+    }
+}
+
+bool CTALUWebData::WaitForReply() {
+    deadline_ = NextDeadline();
+    TraceDebug(QStringLiteral("Waiting..."));
+    QTimer tick;
+    tick.start(kTickMs);
+    for (;;) {
+        if (replyStatus_ != 0) break;
+        PumpOnce();
+        if (Now() > deadline_ || userCancel_) break;
+    }
+    replyKind_ = kNothing;
+    if (replyStatus_ == 0) {
+        // The reply was cut off: its file is closed now, and whatever of it
+        // still comes can never reach a later command.
+        CloseOutputFile();
+        DropConnection();
+    }
+    return replyStatus_ == 1;
+}
+
+void CTALUWebData::DropConnection() {
+    if (socket_) socket_->Close();
+    stream_.Clear();
+    chunkedBody_ = false;
+    closeAfterReply_ = false;
+}
+
+void CTALUWebData::Connect(int /*index*/) {
+    TraceDebug(QStringLiteral("Connect"));
+}
+
+void CTALUWebData::ConnectionRequest(int index, std::int32_t requestId) {
+    TraceDebug(QStringLiteral("ConnectionRequest: ") + QString::number(requestId) +
+               QStringLiteral(" on Winsock: ") + QString::number(index));
+    if (socket_)
+        socket_->Accept(requestId);
+    else
+        ErrorReport(QStringLiteral("ConnectionRequest"), QStringLiteral("Object variable not set"));
+}
+
+void CTALUWebData::Disconnect() {
+    // Bytes of a closed connection never continue on the next one.
+    stream_.Clear();
+    chunkedBody_ = false;
+    closeAfterReply_ = false;
+    if (socket_) socket_->Close();
+}
+
+void CTALUWebData::WError(int /*index*/, int /*number*/, const QString& description) {
+    ShowStatusText(QStringLiteral("WinsockError: ") + description);
+    RestorePointer();
+    Q_EMIT ShowStatus(description);
+}
+
+void CTALUWebData::SendComplete(int /*index*/) {
+    TraceSent(QStringLiteral("Send complete"));
+}
+
+void CTALUWebData::SendProgress(int /*index*/, std::int64_t bytesSent,
+                                std::int64_t bytesRemaining) {
+    TraceDebug(QStringLiteral("SendProgress: BytesSent:") + QString::number(bytesSent) +
+               QStringLiteral(" BytesRemaining: ") + QString::number(bytesRemaining));
+}
+
+void CTALUWebData::DataArrival(int /*index*/, std::int64_t bytes) {
+    if (bytes <= 0) return;
+    try {
+        if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
+        const QByteArray data = socket_->GetData();
+        deadline_ = NextDeadline();
+        stream_.Append(data);
+        static const QMetaMethod received = QMetaMethod::fromSignal(&CTALUWebData::ShowReceived);
+        if (Logging(4) || isSignalConnected(received)) {
+            QByteArray shown = stream_.Unconsumed();
+            shown.replace("\r\n", "\n");
+            const QString text = QString::fromUtf8(shown);
+            TraceReceivedData(text);
+            Q_EMIT ShowReceived(text);
+        }
+        switch (stream_.Drain(*this)) {
+        case ReplyStream::Outcome::Ok:
+            break;
+        case ReplyStream::Outcome::LineTooLong:
+            EndReplyWithError(QStringLiteral("Received more than 1 MiB without a line end"));
+            return;
+        case ReplyStream::Outcome::BadChunking:
+            EndReplyWithError(QStringLiteral("Invalid chunked transfer coding in the reply"));
+            return;
+        }
+        if (dropAfterDrain_) {
+            dropAfterDrain_ = false;
+            DropConnection();
+        }
+    } catch (const WebDataError& e) {
+        ErrorReport(QStringLiteral("DataArrival"), e.Description());
+    }
+}
+
+} // namespace quorvel

@@ -1,0 +1,156 @@
+// The file list against real files: loading, saving, local dates.
+
+#include "app/file_list.h"
+#include "common/recorders.h"
+#include "common/temp_home.h"
+#include "sample_list.h"
+
+#include <QDir>
+#include <QFile>
+
+#include <gtest/gtest.h>
+
+namespace quorvel {
+namespace {
+
+using testing::TempHome;
+
+const QByteArray kOldList = " 1 ~1~keep~keep.csv~0~0~0~0~0~1~0~~~0\r\n";
+
+TEST(FileListLoad, SkipsCommentAndBadLinesAndKeepsOrder) {
+    TempHome home;
+    const QString path =
+        home.Write("files.txt", "Files of farm 1\r\n"
+                                " 1 ~1~First~a.csv~0~0~0~0~0~1~0~~~0\r\n"
+                                "~~~~~\r\n"
+                                "ID~Active~Name~File~Type~Admin\r\n"
+                                "12abc~1~a~b~0~0\r\n1~1~five~fields~0\r\n\r\n"
+                                " 2 ~0~Second~b.csv~1~1~1~1~0~3~0~~2 Jan 2024~9\n");
+    FileList list;
+    list.Append(testing::SampleRecord(9));
+    const ListLoadResult result = list.LoadDataFile(path);
+    EXPECT_TRUE(result.ok && result.errors.empty());
+    ASSERT_EQ(list.Count(), 2);
+    EXPECT_EQ(list.At(0).Name, "First");
+    EXPECT_EQ(list.At(1).FileDate, "2 Jan 2024");
+    EXPECT_EQ(list.LoadedFile, path);
+}
+
+TEST(FileListLoad, MissingFileIsAnEmptyListAndAFolderIsAFailure) {
+    TempHome home;
+    FileList list;
+    list.Append(testing::SampleRecord(1));
+    EXPECT_TRUE(list.LoadDataFile(home.File("none.txt")).ok);
+    EXPECT_TRUE(list.IsEmpty());
+    EXPECT_EQ(list.LoadedFile, home.File("none.txt"));
+
+    ASSERT_TRUE(QDir().mkpath(home.File("dir.txt")));
+    const ListLoadResult result = list.LoadDataFile(home.File("dir.txt"));
+    EXPECT_FALSE(result.ok);
+    ASSERT_EQ(result.errors.size(), 1u);
+    EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + home.File("dir.txt"));
+}
+
+TEST(FileListLoad, OverflowIsReportedWithTheLineAndLoadingGoesOn) {
+    TempHome home;
+    const QString bad = "40000~1~Big~big.csv~0~0~0~0~0~1~0~~~0";
+    FileList list;
+    const ListLoadResult result = list.LoadDataFile(home.Write(
+        "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + bad + "\r\n 3 ~1~c~c.csv~0~0").toUtf8()));
+    EXPECT_TRUE(result.ok);
+    ASSERT_EQ(result.errors.size(), 1u);
+    EXPECT_EQ(result.errors[0], (AppError{"Overflow", "LoadFilesRecord: " + bad}));
+    ASSERT_EQ(list.Count(), 3);
+    EXPECT_EQ(list.At(1), FileRecord{});
+    EXPECT_EQ(list.At(2).FileID, 3);
+}
+
+TEST(FileListSave, SaveAndReloadGiveEveryFieldButTheLocalDate) {
+    TempHome home;
+    FileList list = testing::SampleList(300);
+    list.At(5).FileID = -3;
+    list.At(7).FileDateLocal = "1 Mar 2024";
+    list.Insert(0, NewFileRecord("rain.csv", kLocationApplication, {}));
+    ASSERT_FALSE(list.WriteTo(home.File("files.txt")).has_value());
+    EXPECT_TRUE(
+        home.Read("files.txt").startsWith(" 0 ~1~rain.csv~rain.csv~0~0~0~0~0~1~0~~~0\r\n 1 ~"));
+    FileList again;
+    ASSERT_TRUE(again.LoadDataFile(home.File("files.txt")).ok);
+    list.At(8).FileDateLocal.clear();
+    EXPECT_EQ(again.Records(), list.Records());
+}
+
+TEST(FileListSave, InterruptedSaveLeavesTheOldListAndNoStrayFile) {
+    TempHome home;
+    const QString path = home.Write("files.txt", kOldList);
+    const auto error =
+        testing::SampleList(5).WriteTo(path, [](int written) { return written < 3; });
+    ASSERT_TRUE(error.has_value());
+    EXPECT_EQ(error->where, "SaveFileList:" + path);
+    EXPECT_EQ(home.Read("files.txt"), kOldList);
+    EXPECT_EQ(QDir(home.Path()).entryList(QDir::Files), QStringList{"files.txt"});
+}
+
+TEST(FileListSave, WritesOnlyChangedListsAndWaitsForUsableFolders) {
+    TempHome home;
+    testing::RecordingPorts ports;
+    FileList list;
+    ASSERT_TRUE(list.LoadDataFile(home.Write("files.txt", kOldList)).ok);
+    list.At(0).Name = "edited";
+    LocationFolders folders{home.Path(), home.File("data"), {}, {}, {}, {}};
+    EXPECT_FALSE(list.SaveFileList(folders).has_value());
+    EXPECT_EQ(home.Read("files.txt"), kOldList);
+
+    list.ListChanged = true;
+    home.Write("blocker", "a file where a folder should be");
+    LocationFolders blocked = folders;
+    blocked.data = home.File("blocker/data");
+    EXPECT_FALSE(list.SaveFileList(blocked).has_value());
+    EXPECT_TRUE(list.ListChanged);
+    EXPECT_EQ(home.Read("files.txt"), kOldList);
+
+    EXPECT_FALSE(list.SaveFileList(folders).has_value());
+    EXPECT_FALSE(list.ListChanged);
+    EXPECT_TRUE(home.Read("files.txt").contains("~edited~"));
+
+    // Saved under a new name, an unchanged list is written too.
+    EXPECT_FALSE(list.SaveFileListAs(home.File("copy.txt"), folders).has_value());
+    EXPECT_EQ(home.Read("copy.txt"), home.Read("files.txt"));
+    const auto error = list.SaveFileListAs(home.File("no/such/files.txt"), folders);
+    ASSERT_TRUE(error.has_value());
+    EXPECT_EQ(error->where, "SaveFileList:" + list.LoadedFile);
+    EXPECT_TRUE(list.ListChanged);
+}
+
+TEST(FileListEdit, NewFilesChosenTogetherStandInReverseBeforeTheSelectedEntry) {
+    const LocationFolders folders{"/opt/quorvel", "/data", "Farm1", {}, {}, {}};
+    FileList list;
+    list.Append(testing::SampleRecord(1));
+    int selected = 0;
+    for (const char* path : {"/data/A.csv", "/opt/quorvel/B.csv", "/elsewhere/C.csv"}) {
+        selected = AddNewFileRecord(list, folders, path, selected);
+    }
+    ASSERT_EQ(list.Count(), 4);
+    EXPECT_TRUE(list.ListChanged);
+    EXPECT_EQ(list.At(0), NewFileRecord("C.csv", kLocationOther, "/elsewhere"));
+    EXPECT_EQ(list.At(1), NewFileRecord("B.csv", kLocationApplication, {}));
+    EXPECT_EQ(list.At(2), NewFileRecord("A.csv", kLocationData, {}));
+    EXPECT_EQ(list.At(3), testing::SampleRecord(1));
+}
+
+TEST(LocalDates, TheLastLineForAnIdentifierWins) {
+    TempHome home;
+    home.Write("files.txt", " 4 ~1~a~a.csv~0~0~0~0~0~3~0~~1 Jan 2024~0\r\n"
+                            "comment\r\n"
+                            " 9 ~1~z~z.csv~0~0~0~0~0~3~0~~9 Jan 2024~0\r\n"
+                            " 4 ~1~a~a.csv~0~0~0~0~0~3~0~~5 Jan 2024~0\r\n");
+    FileList list = testing::SampleList(2);
+    list.At(0).FileID = 4;
+    list.At(1).FileID = 5;
+    EXPECT_FALSE(list.LoadLocalDates(home.Path()).has_value());
+    EXPECT_EQ(list.At(0).FileDateLocal, "5 Jan 2024");
+    EXPECT_TRUE(list.At(1).FileDateLocal.isEmpty());
+}
+
+} // namespace
+} // namespace quorvel
