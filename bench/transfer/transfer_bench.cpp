@@ -170,14 +170,14 @@ int main(int argc, char** argv) {
     }
     data.session.SetDetails(data.peer.Server(), QStringLiteral("logger"), QStringLiteral("secret"),
                             false);
-    Register("ftp_download/ours", FtpDownloadOurs, 9);
-    Register("ftp_download/curl", FtpDownloadCurl, 9);
-    Register("ftp_upload/ours", FtpUploadOurs, 9);
-    Register("ftp_upload/curl", FtpUploadCurl, 9);
+    Register("ftp_download/ours", FtpDownloadOurs, 15);
+    Register("ftp_download/curl", FtpDownloadCurl, 15);
+    Register("ftp_upload/ours", FtpUploadOurs, 15);
+    Register("ftp_upload/curl", FtpUploadCurl, 15);
     Register("zip/ours", ZipOurs, 5);
     Register("zip/cli", ZipCli, 5);
-    Register("unzip/ours", UnzipOurs, 9);
-    Register("unzip/cli", UnzipCli, 9);
+    Register("unzip/ours", UnzipOurs, 11);
+    Register("unzip/cli", UnzipCli, 11);
     benchmark::Initialize(&argc, argv);
     benchmark::RunSpecifiedBenchmarks();
     benchmark::Shutdown();
