@@ -4,9 +4,11 @@
 #include "window_fixture.h"
 
 #include "support/shell_open.h"
+#include "transfer/ftp.h"
 #include "webdata/talu_web_data.h"
 
 #include <QDir>
+#include <QTcpServer>
 
 namespace quorvel::testing {
 namespace {
@@ -236,6 +238,31 @@ TEST_F(WindowStatesTest, WebDataEventsReachStatusAndTrace) {
     ASSERT_EQ(C().Lst_Trace->count(), expected.size());
     for (int i = 0; i < expected.size(); ++i)
         EXPECT_EQ(C().Lst_Trace->item(i)->text(), expected[i]);
+}
+
+TEST_F(WindowStatesTest, FtpTraceFollowsTraceAloneAndItsStatusGoesToTheLabel) {
+    // A loopback port with nobody listening: the connection fails at once.
+    QTcpServer probe;
+    ASSERT_TRUE(probe.listen(QHostAddress::LocalHost));
+    const QString server = QStringLiteral("127.0.0.1:%1").arg(probe.serverPort());
+    probe.close();
+    Start();
+    C().chk_Log[0]->setChecked(false);
+    C().Txt_ftpServer->setText(server);
+    C().Chk_Trace->setChecked(true);
+    std::int64_t size = -1;
+    EXPECT_FALSE(ftpRemoteFileSize("data/site.csv", size));
+    ASSERT_GT(C().Lst_Trace->count(), 0);
+    for (int i = 0; i < C().Lst_Trace->count(); ++i) {
+        EXPECT_TRUE(C().Lst_Trace->item(i)->text().startsWith("TraceFTP:"))
+            << C().Lst_Trace->item(i)->text().toStdString();
+    }
+    EXPECT_FALSE(C().Lbl_status->text().isEmpty());
+
+    C().Lst_Trace->clear();
+    C().Chk_Trace->setChecked(false);
+    ftpRemoteFileSize("data/site.csv", size);
+    EXPECT_EQ(C().Lst_Trace->count(), 0);
 }
 
 TEST_F(WindowStatesTest, WebDataWorksWithTheFieldsAsTheyStand) {

@@ -2,6 +2,7 @@
 
 #include "app/ui/frm_web_data_client.h"
 #include "support/ui/progress_bar.h"
+#include "support/ui/status_label.h"
 #include "transfer/ftp.h"
 #include "webdata/combo_sink.h"
 #include "webdata/talu_web_data.h"
@@ -27,9 +28,29 @@ private:
 
 } // namespace
 
+// The FTP module's view of the window: its trace lines have their own switch
+// ("Trace", handed over by ConfigureClass) and its status texts go to the
+// status label alone.
+class FtpDisplay : public TraceView {
+public:
+    explicit FtpDisplay(frm_WebDataClient& window) : window_(window) {}
+    void AddTrace(const QString& line) override {
+        QListWidget* list = window_.Controls().Lst_Trace;
+        list->addItem(line);
+        list->scrollToItem(list->item(list->count() - 1), QAbstractItemView::PositionAtTop);
+    }
+    void ShowStatus(const QString& text) override {
+        SetStatusLabel(window_.Controls().Lbl_status, text);
+    }
+
+private:
+    frm_WebDataClient& window_;
+};
+
 WindowServices::WindowServices(frm_WebDataClient& window)
     : window_(window), socket_(std::make_unique<TcpSocketControl>(1)),
-      webData_(std::make_unique<CTALUWebData>()) {
+      webData_(std::make_unique<CTALUWebData>()),
+      ftpDisplay_(std::make_unique<FtpDisplay>(window)) {
     webData_->MyWinsock(socket_.get());
     QObject::connect(webData_.get(), &CTALUWebData::Finished, &window,
                      [this](const QString& text) { window_.ShowStatus(text); });
@@ -48,7 +69,7 @@ WindowServices::~WindowServices() {
 }
 
 void WindowServices::Attach() {
-    SetFTPDisplay(&window_, window_.Controls().Pic_ProgressFTP);
+    SetFTPDisplay(ftpDisplay_.get(), window_.Controls().Pic_ProgressFTP);
 }
 
 void WindowServices::FillIntervals(QComboBox* combo) const {

@@ -15,6 +15,7 @@ class QComboBox;
 namespace quorvel {
 
 class CTALUWebData;
+class FtpDisplay;
 class TcpSocketControl;
 class frm_WebDataClient;
 
@@ -56,6 +57,7 @@ private:
     frm_WebDataClient& window_;
     std::unique_ptr<TcpSocketControl> socket_;
     std::unique_ptr<CTALUWebData> webData_;
+    std::unique_ptr<FtpDisplay> ftpDisplay_;
 };
 
 } // namespace quorvel
