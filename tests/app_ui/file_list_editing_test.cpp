@@ -214,6 +214,10 @@ TEST_F(MenusTest, SaveWritesTheListUnderTheChosenName) {
     EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("copy.txt"));
     EXPECT_EQ(window->Recent().Entry(1), home.File("copy.txt"));
     EXPECT_FALSE(window->Files().ListChanged);
+    // Saving an unchanged list under a new name still writes it.
+    AnswerDialogs({home.File("again.txt")});
+    C().mnu_File[2]->trigger();
+    EXPECT_TRUE(home.Read("again.txt").contains("~Edited~"));
 }
 
 } // namespace

@@ -19,9 +19,14 @@ protected:
         Start();
         Select(0);
     }
-    int Download() { return C().Opt_Download->CheckedIndex(); }
-    int Upload() { return C().Opt_Upload->CheckedIndex(); }
-    int Method() { return C().Opt_MethodID->CheckedIndex(); }
+    // The transfer rules as "D<download> U<upload> M<method> Z<zip>".
+    QString Rules() {
+        return QStringLiteral("D%1 U%2 M%3 Z%4")
+            .arg(C().Opt_Download->CheckedIndex())
+            .arg(C().Opt_Upload->CheckedIndex())
+            .arg(C().Opt_MethodID->CheckedIndex())
+            .arg(C().Chk_Zip->isChecked() ? 1 : 0);
+    }
     void ChooseType(int typeId) {
         C().Cmb_TypeID->setCurrentIndex(C().Cmb_TypeID->findData(typeId));
     }
@@ -31,36 +36,19 @@ protected:
 TEST_F(RecordRulesTest, DirectionMethodZipAndTypeRulesHoldEachOtherInCheck) {
     ASSERT_EQ(C().Cmb_TypeID->count(), 9);
     EXPECT_EQ(C().Cmb_TypeID->itemText(0), "[no date]");
-    struct Step {
-        const char* what;
-        std::function<void()> act;
-        int download, upload, method;
-        bool zip;
-    };
     auto click = [](QAbstractButton* b) { return [b] { b->click(); }; };
-    const Step steps[] = {
-        {"upload always", click(C().Opt_Upload->Button(kUploadAlways)), kDownloadNever,
-         kUploadAlways, kMethodCompleteFile, false},
-        {"download always", click(C().Opt_Download->Button(kDownloadAlways)), kDownloadAlways,
-         kUploadNever, kMethodCompleteFile, false},
-        {"zip", [this] { C().Chk_Zip->setChecked(true); }, kDownloadAlways, kUploadNever,
-         kMethodCompleteFile, true},
-        {"only new data", click(C().Opt_MethodID->Button(kMethodOnlyNewData)), kDownloadAlways,
-         kUploadNever, kMethodOnlyNewData, false},
-        {"zip clicked", click(C().Chk_Zip), kDownloadAlways, kUploadNever, kMethodCompleteFile,
-         true},
-        {"dated type", [this] { ChooseType(4); }, kDownloadAlways, kUploadNever, kMethodOnlyNewData,
-         false},
-        {"undated type", [this] { ChooseType(0); }, kDownloadAlways, kUploadNever,
-         kMethodCompleteFile, false},
+    const std::pair<std::function<void()>, QString> steps[] = {
+        {click(C().Opt_Upload->Button(kUploadAlways)), "D0 U1 M0 Z0"},
+        {click(C().Opt_Download->Button(kDownloadAlways)), "D1 U0 M0 Z0"},
+        {[this] { C().Chk_Zip->setChecked(true); }, "D1 U0 M0 Z1"},
+        {click(C().Opt_MethodID->Button(kMethodOnlyNewData)), "D1 U0 M1 Z0"},
+        {click(C().Chk_Zip), "D1 U0 M0 Z1"},
+        {[this] { ChooseType(4); }, "D1 U0 M1 Z0"},
+        {[this] { ChooseType(0); }, "D1 U0 M0 Z0"},
     };
-    for (const Step& step : steps) {
-        SCOPED_TRACE(step.what);
-        step.act();
-        EXPECT_EQ(Download(), step.download);
-        EXPECT_EQ(Upload(), step.upload);
-        EXPECT_EQ(Method(), step.method);
-        EXPECT_EQ(C().Chk_Zip->isChecked(), step.zip);
+    for (std::size_t i = 0; i < std::size(steps); ++i) {
+        steps[i].first();
+        EXPECT_EQ(Rules(), steps[i].second) << "step " << i;
     }
 }
 
