@@ -29,7 +29,6 @@ TEST(AppSettingsLoad, FirstStartWithoutAFileGivesEveryDefault) {
     AppSettings s;
     EXPECT_FALSE(s.Load(LocalSettings(ProgramHome::SettingsFile())).has_value());
     EXPECT_EQ(s, AppSettings::Defaults(home.Path(), 2031));
-    EXPECT_TRUE(s.cfgUrl.isEmpty() && s.userId.isEmpty() && s.password.isEmpty());
     EXPECT_TRUE(s.applicationFolder == home.Path() && s.dataFolder == home.Path());
     EXPECT_EQ((std::array{s.showDate0, s.getLocalFolders, s.getFileList, s.automatic,
                           s.downloadOnly, s.whichdates}),

@@ -36,7 +36,7 @@ TEST(FileListLoad, SkipsCommentAndBadLinesAndKeepsOrder) {
     EXPECT_EQ(list.LoadedFile, path);
 }
 
-TEST(FileListLoad, MissingFileIsAnEmptyListAndAFolderIsAFailure) {
+TEST(FileListLoad, MissingFileIsEmptyAFolderFailsAndAnOverflowIsReported) {
     TempHome home;
     FileList list;
     list.Append(testing::SampleRecord(1));
@@ -49,17 +49,14 @@ TEST(FileListLoad, MissingFileIsAnEmptyListAndAFolderIsAFailure) {
     EXPECT_FALSE(result.ok);
     ASSERT_EQ(result.errors.size(), 1u);
     EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + home.File("dir.txt"));
-}
 
-TEST(FileListLoad, OverflowIsReportedWithTheLineAndLoadingGoesOn) {
-    TempHome home;
+    // An overflowing identifier is reported with its line and the loading goes on.
     const QString bad = "40000~1~Big~big.csv~0~0~0~0~0~1~0~~~0";
-    FileList list;
-    const ListLoadResult result = list.LoadDataFile(home.Write(
+    const ListLoadResult overflow = list.LoadDataFile(home.Write(
         "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + bad + "\r\n 3 ~1~c~c.csv~0~0").toUtf8()));
-    EXPECT_TRUE(result.ok);
-    ASSERT_EQ(result.errors.size(), 1u);
-    EXPECT_EQ(result.errors[0], (AppError{"Overflow", "LoadFilesRecord: " + bad}));
+    EXPECT_TRUE(overflow.ok);
+    ASSERT_EQ(overflow.errors.size(), 1u);
+    EXPECT_EQ(overflow.errors[0], (AppError{"Overflow", "LoadFilesRecord: " + bad}));
     ASSERT_EQ(list.Count(), 3);
     EXPECT_EQ(list.At(1), FileRecord{});
     EXPECT_EQ(list.At(2).FileID, 3);

@@ -34,7 +34,7 @@ TEST(LocationFolder, EachLocationOnThisPcAndAtTheService) {
     EXPECT_EQ(GetLocationFolder(f, kLocationOther, kOnThisPc), "/var/logs");
 }
 
-TEST(ProcessFilename, FileNamesWithBackslashesTravelWithTheSideSeparator) {
+TEST(ProcessFilename, BackslashesTravelWithTheSideSeparatorAndUserFoldersOnlyHold) {
     EXPECT_EQ(PathOf(kFarm, "site\\log.csv", kLocationUserCurrent, kOnThisPc),
               "/data/Farm1/2024/site/log.csv");
     EXPECT_EQ(PathOf(kFarm, "site\\log.csv", kLocationUser, kAtService),
@@ -44,9 +44,7 @@ TEST(ProcessFilename, FileNamesWithBackslashesTravelWithTheSideSeparator) {
     f.other = "in\\box";
     EXPECT_EQ(PathOf(f, "a.csv", kLocationOther, kOnThisPc), "/srv/data/in/box/a.csv");
     EXPECT_EQ(PathOf(f, "a.csv", kLocationOther, kAtService), "data/clients/in/box/a.csv");
-}
-
-TEST(ProcessFilename, UserFoldersOnlyKeepsTheServicePathInTheUsersFolders) {
+    // With user folders only, the service path stays in the user's folders.
     EXPECT_EQ(PathOf(kFarm, "a.csv", kLocationApplication, kAtService, true),
               "data/clients/Farm1/a.csv");
     EXPECT_EQ(PathOf(kFarm, "a.csv", kLocationUserCurrent, kAtService, true),

@@ -16,15 +16,14 @@ QStringList Entries(const RecentFiles& recent) {
     return out;
 }
 
-TEST(RecentFiles, TheSixthNamePushesTheOldestOut) {
+TEST(RecentFiles, TheSixthPushesTheOldestOutAndAnotherCaseMovesToTheTop) {
     RecentFiles recent;
     for (const char* name : {"a", "b", "c", "d", "e", "f"})
         recent.Add(name);
     EXPECT_EQ(Entries(recent), (QStringList{"f", "e", "d", "c", "b"}));
-}
 
-TEST(RecentFiles, ANameInAnotherLetterCaseMovesToTheTop) {
-    RecentFiles recent;
+    // A name in another letter case moves to the top.
+    recent = RecentFiles();
     for (const char* name : {"/l/a.txt", "/l/b.txt", "/l/c.txt", "/l/d.txt"})
         recent.Add(name);
     recent.Add("/L/B.TXT");

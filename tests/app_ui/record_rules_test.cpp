@@ -1,8 +1,12 @@
-// The record fields and their mutual rules, and how edits reach the records.
+// The record fields and their mutual rules, how edits reach the records, and
+// the route diagram drawn from them on the "Files" page.
 
 #include "window_fixture.h"
 
 #include <QDir>
+#include <QImage>
+
+#include <functional>
 
 namespace quorvel::testing {
 namespace {
@@ -15,53 +19,37 @@ protected:
         Start();
         Select(0);
     }
-    int Download() { return C().Opt_Download->CheckedIndex(); }
-    int Upload() { return C().Opt_Upload->CheckedIndex(); }
-    int Method() { return C().Opt_MethodID->CheckedIndex(); }
+    // The transfer rules as "D<download> U<upload> M<method> Z<zip>".
+    QString Rules() {
+        return QStringLiteral("D%1 U%2 M%3 Z%4")
+            .arg(C().Opt_Download->CheckedIndex())
+            .arg(C().Opt_Upload->CheckedIndex())
+            .arg(C().Opt_MethodID->CheckedIndex())
+            .arg(C().Chk_Zip->isChecked() ? 1 : 0);
+    }
     void ChooseType(int typeId) {
         C().Cmb_TypeID->setCurrentIndex(C().Cmb_TypeID->findData(typeId));
     }
 };
 
-TEST_F(RecordRulesTest, AlwaysInOneDirectionExcludesAlwaysInTheOther) {
-    C().Opt_Upload->Button(kUploadAlways)->click();
-    C().Opt_Download->Button(kDownloadAlways)->click();
-    EXPECT_EQ(Download(), kDownloadAlways);
-    EXPECT_EQ(Upload(), kUploadNever);
-
-    C().Opt_Upload->Button(kUploadAlways)->click();
-    EXPECT_EQ(Upload(), kUploadAlways);
-    EXPECT_EQ(Download(), kDownloadNever);
-}
-
-TEST_F(RecordRulesTest, ZippedFilesAlwaysTravelWhole) {
-    C().Opt_MethodID->Button(kMethodCompleteFile)->click();
-    C().Chk_Zip->setChecked(true);
-    C().Opt_MethodID->Button(kMethodOnlyNewData)->click();
-    EXPECT_FALSE(C().Chk_Zip->isChecked());
-
-    C().Chk_Zip->click();
-    EXPECT_TRUE(C().Chk_Zip->isChecked());
-    EXPECT_EQ(Method(), kMethodCompleteFile);
-}
-
-TEST_F(RecordRulesTest, DataTypeChoosesTheMethod) {
+// Each step acts on the fields shown and the rules settle the others.
+TEST_F(RecordRulesTest, DirectionMethodZipAndTypeRulesHoldEachOtherInCheck) {
     ASSERT_EQ(C().Cmb_TypeID->count(), 9);
     EXPECT_EQ(C().Cmb_TypeID->itemText(0), "[no date]");
-    C().Chk_Zip->setChecked(true);
-    ChooseType(4);
-    EXPECT_EQ(Method(), kMethodOnlyNewData);
-    // Only new data never travels zipped.
-    EXPECT_FALSE(C().Chk_Zip->isChecked());
-    ChooseType(0);
-    EXPECT_EQ(Method(), kMethodCompleteFile);
-}
-
-TEST_F(RecordRulesTest, ShowingARecordIsNoEdit) {
-    Select(1);
-    EXPECT_FALSE(window->Flags().RecordEdited);
-    EXPECT_FALSE(window->Files().ListChanged);
-    EXPECT_FALSE(C().Cmd_DoFile[4]->isEnabled());
+    auto click = [](QAbstractButton* b) { return [b] { b->click(); }; };
+    const std::pair<std::function<void()>, QString> steps[] = {
+        {click(C().Opt_Upload->Button(kUploadAlways)), "D0 U1 M0 Z0"},
+        {click(C().Opt_Download->Button(kDownloadAlways)), "D1 U0 M0 Z0"},
+        {[this] { C().Chk_Zip->setChecked(true); }, "D1 U0 M0 Z1"},
+        {click(C().Opt_MethodID->Button(kMethodOnlyNewData)), "D1 U0 M1 Z0"},
+        {click(C().Chk_Zip), "D1 U0 M0 Z1"},
+        {[this] { ChooseType(4); }, "D1 U0 M1 Z0"},
+        {[this] { ChooseType(0); }, "D1 U0 M0 Z0"},
+    };
+    for (std::size_t i = 0; i < std::size(steps); ++i) {
+        steps[i].first();
+        EXPECT_EQ(Rules(), steps[i].second) << "step " << i;
+    }
 }
 
 TEST_F(RecordRulesTest, EditsReachTheRecordWhenAnotherEntryIsSelected) {
@@ -74,10 +62,8 @@ TEST_F(RecordRulesTest, EditsReachTheRecordWhenAnotherEntryIsSelected) {
     C().Txt_FileDate->setText("1 Nov 2024");
     C().Chk_Active->setChecked(false);
     ChooseType(2);
-    EXPECT_TRUE(window->Flags().RecordEdited);
-    EXPECT_TRUE(window->Files().ListChanged);
-    // Not stored yet.
-    EXPECT_EQ(window->Files().At(0).Name, "A");
+    EXPECT_TRUE(window->Flags().RecordEdited && window->Files().ListChanged);
+    EXPECT_EQ(window->Files().At(0).Name, "A"); // not stored yet
 
     Select(1);
     const FileRecord& r = window->Files().At(0);
@@ -118,6 +104,71 @@ TEST_F(RecordRulesTest, FileNameFromTheChooserSetsTheUserLocation) {
     C().Cmd_LocateFile->click();
     EXPECT_EQ(C().Txt_FileName->text(), "x.dat");
     EXPECT_TRUE(ports.prompter.shown.empty());
+}
+
+const QRgb kDarkRed = qRgb(128, 0, 0);
+const QRgb kBlue = qRgb(0, 0, 255);
+
+class RouteTest : public WindowTest {
+protected:
+    void SetUp() override {
+        UserMaintainsList();
+        // admin "Application folder", user "User folder"
+        WriteList({" 0 ~1~R~r.csv~0~0~2~0~0~1~0~~~0"});
+        Start();
+        Select(0);
+        C().SSTab1->setCurrentIndex(1);
+        Pump();
+    }
+    // Rows of pixels of the given colour in one column of the page.
+    static std::vector<int> RowsOf(const QImage& image, int x, QRgb colour) {
+        std::vector<int> rows;
+        for (int y = 0; y < image.height(); ++y)
+            if ((image.pixel(x, y) & 0xffffff) == (colour & 0xffffff)) rows.push_back(y);
+        return rows;
+    }
+    int RowCentre(QWidget* button) {
+        return button->mapTo(C().FilesPage, QPoint(0, button->height() / 2)).y();
+    }
+};
+
+TEST_F(RouteTest, LinesRunFromTheRowsOfTheRecordInTheColourOfTheirDirection) {
+    const int left = C().Pic_Route[0]->geometry().left() + 1;
+    const int right = C().Opt_UserLocationID->Button(0)->mapTo(C().FilesPage, QPoint()).x() - 5;
+    auto page = [&] {
+        Pump();
+        return C().FilesPage->grab().toImage();
+    };
+    // Download always: a two-pixel dark red line from the admin row to the user row; it runs
+    // on inside the "User PC" frame up to the buttons.
+    QImage image = page();
+    const auto start = RowsOf(image, left, kDarkRed);
+    ASSERT_EQ(start.size(), 2u);
+    EXPECT_NEAR(start.front(), RowCentre(C().Opt_AdminLocationID->Button(0)), 2);
+    const auto end = RowsOf(image, right, kDarkRed);
+    ASSERT_FALSE(end.empty());
+    EXPECT_NEAR(end.front(), RowCentre(C().Opt_UserLocationID->Button(2)), 3);
+    EXPECT_TRUE(RowsOf(image, left, kBlue).empty());
+
+    // An upload goes back to the administrator's user row, not the application folder row.
+    C().Opt_Upload->Button(kUploadAlways)->click(); // also sets download "Never"
+    C().Opt_Download->Button(kDownloadDate)->click();
+    image = page();
+    const auto blue = RowsOf(image, left, kBlue);
+    ASSERT_FALSE(blue.empty());
+    EXPECT_NEAR(blue.front(), RowCentre(C().Opt_AdminLocationID->Button(kLocationUser)), 4);
+    const auto red = RowsOf(image, left, kDarkRed);
+    ASSERT_FALSE(red.empty());
+    EXPECT_LT(red.front(), RowCentre(C().Opt_AdminLocationID->Button(0)));
+
+    // No transfer: nothing drawn.
+    C().Opt_Upload->Button(kUploadNever)->click();
+    C().Opt_Download->Button(kDownloadNever)->click();
+    image = page();
+    for (int x = left - 1; x < right + 5; x += 7) {
+        EXPECT_TRUE(RowsOf(image, x, kDarkRed).empty()) << x;
+        EXPECT_TRUE(RowsOf(image, x, kBlue).empty()) << x;
+    }
 }
 
 } // namespace

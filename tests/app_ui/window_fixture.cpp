@@ -39,6 +39,15 @@ void WindowTest::UserMaintainsList() {
     Setting(QStringLiteral("GetLocalFolders"), QStringLiteral("0"));
 }
 
+frm_WebDataClient& WindowTest::StartWith(const QStringList& names) {
+    UserMaintainsList();
+    QStringList lines;
+    for (const QString& name : names)
+        lines << Line(name, name.toLower() + ".csv");
+    WriteList(lines);
+    return Start();
+}
+
 frm_WebDataClient& WindowTest::Start(const QStringList& arguments) {
     window = std::make_unique<frm_WebDataClient>(arguments);
     FileDialogs dialogs;
@@ -75,6 +84,11 @@ QStringList WindowTest::ListNames() const {
     for (int i = 0; i < window->Controls().Lst_Files->count(); ++i)
         names << window->Controls().Lst_Files->item(i)->text();
     return names;
+}
+
+void WindowTest::ExpectEnabled(std::initializer_list<QWidget*> widgets, bool enabled) {
+    for (QWidget* w : widgets)
+        EXPECT_EQ(w->isEnabled(), enabled) << w->objectName().toStdString();
 }
 
 void WindowTest::AnswerDialogs(const QStringList& files) {

@@ -40,6 +40,8 @@ protected:
                         int upload = 0);
     // Lets the user edit the list: the list and the folders come from the user.
     void UserMaintainsList();
+    // Starts with a list the user maintains: "A" for a.csv and so on.
+    frm_WebDataClient& StartWith(const QStringList& names);
 
     // Builds, loads and shows the window and lets its first activation run.
     frm_WebDataClient& Start(const QStringList& arguments = {});
@@ -51,6 +53,7 @@ protected:
     WindowControls& C() { return window->Controls(); }
     void Select(int row);
     QStringList ListNames() const;
+    static void ExpectEnabled(std::initializer_list<QWidget*> widgets, bool enabled);
     // Answers the next file dialogs with these paths (empty: cancelled).
     void AnswerDialogs(const QStringList& files);
 

@@ -33,7 +33,7 @@ protected:
     }
 };
 
-TEST_F(BusyPointerTest, NestedPointersKeepTheHourglassUntilBothAreGone) {
+TEST_F(BusyPointerTest, NestedPointersKeepTheHourglassUntilAllAreGone) {
     {
         CMousePointer outer;
         outer.SetMousePointer(Qt::BusyCursor);
@@ -46,9 +46,7 @@ TEST_F(BusyPointerTest, NestedPointersKeepTheHourglassUntilBothAreGone) {
         EXPECT_EQ(Shown(), Qt::WaitCursor);
     }
     EXPECT_EQ(Shown(), Qt::PointingHandCursor);
-}
-
-TEST_F(BusyPointerTest, PortIgnoresUnmatchedPopsAndGivesBackWhatItHolds) {
+    // The port ignores unmatched pops and gives back what it holds.
     {
         OverrideBusyPointer busy;
         {

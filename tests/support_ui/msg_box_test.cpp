@@ -37,7 +37,7 @@ protected:
     WidgetPrompter prompter;
 };
 
-TEST(MsgBoxLayoutTest, TextAreaFromTheLetterSize) {
+TEST(MsgBoxLayoutTest, TextAreaFromTheLetterSizeAndButtonsRightToLeft) {
     const MsgBoxLayout small = ComputeMsgBoxLayout(10, {7, 13}, {81, 25}, kButtonsOk);
     EXPECT_EQ(small.textRect, QRect(12, 24, 250, 60)); // 3 lines at least, 250 x 60 at least
     EXPECT_EQ(small.width, 298);
@@ -49,21 +49,17 @@ TEST(MsgBoxLayoutTest, TextAreaFromTheLetterSize) {
     EXPECT_EQ(ComputeMsgBoxLayout(220, {8, 16}, {81, 25}, 0).textRect.height(), 96);
     // Text that really needs more room (many line breaks) is never cut off.
     EXPECT_EQ(ComputeMsgBoxLayout(20, {8, 16}, {81, 25}, 0, 150).buttonTop, 182);
-}
 
-TEST(MsgBoxLayoutTest, ButtonsRunRightToLeftAndWidenTheWindow) {
     EXPECT_EQ(ComputeMsgBoxLayout(10, {7, 13}, {80, 25}, kButtonsOk).buttonLeft[0], 149 - 40);
     const MsgBoxLayout two = ComputeMsgBoxLayout(10, {7, 13}, {80, 25}, kButtonsYesNo);
-    EXPECT_EQ(two.buttonLeft[0], 151);
-    EXPECT_EQ(two.buttonLeft[1], 69);
+    EXPECT_EQ((std::array{two.buttonLeft[0], two.buttonLeft[1]}), (std::array{151, 69}));
     const MsgBoxLayout three = ComputeMsgBoxLayout(10, {7, 13}, {81, 25}, kButtonsYesNoCancel);
     EXPECT_EQ(three.width, 298);
     EXPECT_EQ(three.buttonLeft, (std::array<int, 3>{192, 109, 26}));
+    // Wide buttons widen the window only when three of them need it.
     EXPECT_EQ(ComputeMsgBoxLayout(10, {7, 13}, {100, 25}, kButtonsYesNoCancel).width, 324);
     EXPECT_EQ(ComputeMsgBoxLayout(10, {7, 13}, {100, 25}, kButtonsYesNo).width, 298);
-}
-
-TEST(MsgBoxLayoutTest, CountDownFiguresForTicksArrivingEarlyOrLate) {
+    // The count-down for ticks arriving early or late.
     EXPECT_EQ(frm_MyMsgBox::SecondsLeft(4003), 4);
     EXPECT_EQ(frm_MyMsgBox::SecondsLeft(997), 1);
     EXPECT_EQ(frm_MyMsgBox::SecondsLeft(4), 0);
@@ -71,12 +67,12 @@ TEST(MsgBoxLayoutTest, CountDownFiguresForTicksArrivingEarlyOrLate) {
 
 TEST_F(TimedBoxTest, UnansweredBoxReturnsTheDefaultOfItsSet) {
     ShortenWait(30ms);
-    EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), kButtonsOk), kAnswerOk);
-    EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), kButtonsOkCancel), kAnswerOk);
-    EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), 3 + 32), kAnswerYes);
-    EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), 4 + 48), kAnswerYes);
-    EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), kButtonsRetryCancel),
-              kAnswerRetry);
+    for (const auto& [buttons, answer] : {std::pair<int, int>{kButtonsOk, kAnswerOk},
+                                          {kButtonsOkCancel, kAnswerOk},
+                                          {3 + 32, kAnswerYes},
+                                          {4 + 48, kAnswerYes},
+                                          {kButtonsRetryCancel, kAnswerRetry}})
+        EXPECT_EQ(prompter.MyMsgBox(QStringLiteral("Nobody answers"), buttons), answer) << buttons;
     EXPECT_FALSE(prompter.Box()->isVisible());
 }
 
