@@ -21,7 +21,7 @@ void ExpectSame(DateValue actual, DateValue expected) {
         << FormatDateIso(actual).toStdString() << " vs " << FormatDateIso(expected).toStdString();
 }
 
-TEST_F(Layouts, EveryLayoutReadsTheDateOfALineAndOfAFilesLastLine) {
+TEST_F(Layouts, EveryLayoutReadsTheDateOfAFilesLastLine) {
     const QString dayMonth = SystemDateOrder() == NumericDateOrder::DayFirst
                                  ? QStringLiteral("01/05/2006")
                                  : QStringLiteral("05/01/2006");
@@ -47,12 +47,9 @@ TEST_F(Layouts, EveryLayoutReadsTheDateOfALineAndOfAFilesLastLine) {
     };
     web.EnableLog(3, 1);
     for (const auto& c : cases) {
-        SCOPED_TRACE(c.line.toStdString());
-        const LineDate d = DateOfLine(c.line, c.type);
-        EXPECT_TRUE(d.found && d.hasDate);
-        ExpectSame(d.value, c.date);
         EXPECT_EQ(LastDate("2000-01-01 00:00:00,1\r\n" + c.line.toUtf8() + "\r\n", c.type),
-                  FormatDateLong(c.date));
+                  FormatDateLong(c.date))
+            << c.line.toStdString();
     }
     EXPECT_TRUE(
         logs.contains(QStringLiteral("D>TekSmart:2006-05-01 10:20:30 -> 2006-05-01 10:20:30")));

@@ -2,10 +2,8 @@
 #include "webdata_fixture.h"
 
 #include <QProcess>
-#include <QProcessEnvironment>
 #include <QScopeGuard>
 #include <QStandardPaths>
-#include <QTcpSocket>
 
 namespace quorvel::testing {
 namespace {
@@ -19,33 +17,21 @@ TEST_F(WebDataTest, PhpsWebServerGivesTheRightUserOnlyTheRecordsAfterTheLocalLas
     home.Write(QStringLiteral("www/wd/wd.php"), script.readAll());
     const QByteArray records = "2006-05-01 10:00:00,1\n2006-05-01 10:10:00,2\n"
                                "2006-05-01 10:20:00,3\n2006-05-01 10:30:00,4\n";
-    home.Write(QStringLiteral("service/site1.dat"), records);
+    home.Write(QStringLiteral("www/wd/data/site1.dat"), records);
 
     const QString address = ScriptServer().HostPort(); // a port nobody listens on
     QProcess service;
-    QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
-    env.insert(QStringLiteral("WD_DATA"), home.File(QStringLiteral("service")));
-    service.setProcessEnvironment(env);
     service.setStandardErrorFile(QProcess::nullDevice());
-    service.setStandardOutputFile(QProcess::nullDevice());
     service.start(php, {"-S", address, "-t", home.File(QStringLiteral("www"))});
     const auto stop = qScopeGuard([&] {
         service.kill();
         service.waitForFinished();
     });
-    const quint16 port = quint16(address.section(QLatin1Char(':'), 1).toUInt());
-    ASSERT_TRUE(PumpUntil(
-        [port] {
-            QTcpSocket probe;
-            probe.connectToHost(QHostAddress::LocalHost, port);
-            return probe.waitForConnected(100);
-        },
-        10000));
     web.SetRemoteHost(address);
     web.SetUserID(QStringLiteral("ann"));
     web.SetPassword(QStringLiteral("p&ss word"));
-
-    ASSERT_TRUE(web.Initialise());
+    // Refused until the server listens.
+    ASSERT_TRUE(PumpUntil([&] { return web.Initialise(); }, 10000));
     EXPECT_EQ(web.UserName(), QStringLiteral("Ann Example"));
     EXPECT_EQ(web.UserDataFolder(), QStringLiteral("users/ann/data"));
     const QString local = home.Write(QStringLiteral("site1.dat"),
