@@ -33,7 +33,7 @@ TEST_F(WebDataTest, RequestsAreByteExactWithAddressHostAndEscapedValues) {
     QueueNewData("OK NO FILE yet", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
     EXPECT_TRUE(web.GetNewData(missing, 2, 1));
     EXPECT_TRUE(server.requests.last().contains("&filelocation=2&date=0 HTTP/1.1"));
-    EXPECT_EQ(FileBytes(QStringLiteral("new.dat")), kTwoRecords);
+    EXPECT_EQ(home.Read(QStringLiteral("new.dat")), kTwoRecords);
     EXPECT_EQ(web.ServerLastDate(), 0);
     EXPECT_TRUE(statuses.contains(QStringLiteral("Data in: ") + missing));
     EXPECT_EQ(busy.depth, 0);
@@ -84,7 +84,8 @@ TEST_F(WebDataTest, AReplyLeavesExactlyItsWholeRecordsInTheFile) {
         server.replies.clear();
         QueueNewData("OK 2006-05-03 00:00:00", c.reply);
         EXPECT_EQ(web.GetNewData(file, 1, 1), c.ok);
-        EXPECT_EQ(QFile::exists(file) ? FileBytes(name) : QByteArray(), c.after);
+        EXPECT_EQ(QFile::exists(file), !c.after.isEmpty());
+        EXPECT_EQ(home.Read(name), c.after);
         EXPECT_TRUE(web.LastError().startsWith(QLatin1String(c.error)));
     }
     // Only the closed connection and the one given up on the endless line were replaced.
@@ -99,7 +100,7 @@ TEST_F(WebDataTest, RecordsSurviveASplitAtEveryByteOfTheReply) {
         const QString file = home.Write(name, "2006-05-01 10:00:00,0\r\n");
         QueueNewData("OK 0", SplitAt(reply, {at}));
         ASSERT_TRUE(web.GetNewData(file, 1, 1));
-        ASSERT_EQ(FileBytes(name), "2006-05-01 10:00:00,0\r\n" + kTwoRecords);
+        ASSERT_EQ(home.Read(name), "2006-05-01 10:00:00,0\r\n" + kTwoRecords);
     }
     EXPECT_EQ(server.connections, 1);
 }
@@ -114,7 +115,7 @@ TEST_F(WebDataTest, AChunkedReplyIsDechunkedBeforeItIsCutIntoLines) {
     const QString file = home.File(QStringLiteral("chunked.dat"));
 
     EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("chunked.dat")), records);
+    EXPECT_EQ(home.Read(QStringLiteral("chunked.dat")), records);
     // The last chunk and its blank line were taken: the connection serves the next reply.
     EXPECT_TRUE(web.Initialise());
     EXPECT_EQ(server.connections, 1);
@@ -230,7 +231,7 @@ TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     const QString first = home.File(QStringLiteral("first.dat"));
     EXPECT_FALSE(web.GetNewData(first, 1, 1));
     // Closed when the wait ended: complete on disk already.
-    EXPECT_EQ(FileBytes(QStringLiteral("first.dat")), kTwoRecords);
+    EXPECT_EQ(home.Read(QStringLiteral("first.dat")), kTwoRecords);
 
     const QByteArray other = "2006-06-01 00:00:00,9\r\n";
     QueueNewData("OK 0", {Send(HttpReply(other + "OK\r\n"))});
@@ -239,8 +240,8 @@ TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     ASSERT_TRUE(PumpUntil([&] { return server.sends == 5; }));
     QCoreApplication::processEvents();
 
-    EXPECT_EQ(FileBytes(QStringLiteral("first.dat")), kTwoRecords);
-    EXPECT_EQ(FileBytes(QStringLiteral("second.dat")), other);
+    EXPECT_EQ(home.Read(QStringLiteral("first.dat")), kTwoRecords);
+    EXPECT_EQ(home.Read(QStringLiteral("second.dat")), other);
     EXPECT_EQ(server.connections, 2);
 }
 

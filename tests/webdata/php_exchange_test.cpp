@@ -4,6 +4,7 @@
 #include <QProcess>
 #include <QScopeGuard>
 #include <QStandardPaths>
+#include <QTcpSocket>
 
 namespace quorvel::testing {
 namespace {
@@ -30,21 +31,28 @@ TEST_F(WebDataTest, PhpsWebServerGivesTheRightUserOnlyTheRecordsAfterTheLocalLas
     web.SetRemoteHost(address);
     web.SetUserID(QStringLiteral("ann"));
     web.SetPassword(QStringLiteral("p&ss word"));
-    // Refused until the server listens.
-    ASSERT_TRUE(PumpUntil([&] { return web.Initialise(); }, 10000));
+    const quint16 port = quint16(address.section(QLatin1Char(':'), 1).toUInt());
+    ASSERT_TRUE(PumpUntil(
+        [port] {
+            QTcpSocket probe;
+            probe.connectToHost(QHostAddress::LocalHost, port);
+            return probe.waitForConnected(100);
+        },
+        10000));
+    ASSERT_TRUE(web.Initialise());
     EXPECT_EQ(web.UserName(), QStringLiteral("Ann Example"));
     EXPECT_EQ(web.UserDataFolder(), QStringLiteral("users/ann/data"));
     const QString local = home.Write(QStringLiteral("site1.dat"),
                                      "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n");
     ASSERT_TRUE(web.GetNewData(local, 1, 1)) << web.LastError().toStdString();
     const QByteArray expected = QByteArray(records).replace("\n", "\r\n");
-    EXPECT_EQ(FileBytes(QStringLiteral("site1.dat")), expected);
+    EXPECT_EQ(home.Read(QStringLiteral("site1.dat")), expected);
     EXPECT_EQ(web.LastDateInFile(QStringLiteral("site1.dat"), 1, 1, 1, 1),
               QStringLiteral("1 May 2006 10:30:00"));
     // Asked again, the service has nothing newer.
     ASSERT_TRUE(web.GetNewData(local, 1, 1));
     EXPECT_EQ(web.LastError(), QStringLiteral("No new data"));
-    EXPECT_EQ(FileBytes(QStringLiteral("site1.dat")), expected);
+    EXPECT_EQ(home.Read(QStringLiteral("site1.dat")), expected);
 
     web.SetPassword(QStringLiteral("wrong"));
     EXPECT_FALSE(web.Initialise());

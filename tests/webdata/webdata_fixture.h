@@ -12,6 +12,7 @@
 #include <QCoreApplication>
 #include <QElapsedTimer>
 #include <QFile>
+#include <QFileInfo>
 #include <QStringList>
 
 #include <gtest/gtest.h>
@@ -40,11 +41,7 @@ protected:
         QObject::connect(&web, &CTALUWebData::ShowLog, [this](const QString& m) { logs << m; });
     }
 
-    QByteArray FileBytes(const QString& name) const { return home.Read(name); }
-    QByteArray LogBytes() const {
-        QFile file(ProgramHome::LogFile());
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
-    }
+    QByteArray LogBytes() const { return home.Read(QFileInfo(ProgramHome::LogFile()).fileName()); }
     // Pumps events until pred holds or ms pass; returns pred().
     template <typename Pred> static bool PumpUntil(Pred pred, int ms = 2000) {
         QElapsedTimer timer;
