@@ -163,8 +163,6 @@ TEST_F(WebDataTest, UserFoldersNeedFiveItems) {
     EXPECT_EQ((QStringList{web.UserFolder(), web.UserCurrentFolder(), web.UserDataFolder(),
                            web.UserName()}),
               (QStringList{"uf", "ucf", "udf", "Ann Smith"}));
-    EXPECT_TRUE(
-        server.requests[1].contains("cmd=GETUSERFOLDERS&user=U&pwd=P&dt=0&filelocation=0 "));
 }
 
 TEST_F(WebDataTest, TraceServerModeSavesNothingButFinishes) {
@@ -257,7 +255,13 @@ TEST_F(WebDataTest, AnUnwritableFileIsReportedAndTheCommandFails) {
     EXPECT_FALSE(QFile::exists(file));
 }
 
-TEST_F(WebDataTest, AServerThatNeverAnswersTimesOutUnlessCancelEndsTheWaitFirst) {
+TEST_F(WebDataTest, ARefusedConnectionFailsASilentServerTimesOutAndCancelEndsTheWait) {
+    web.SetRemoteHost(ScriptServer().HostPort()); // nobody listens there any more
+    EXPECT_FALSE(web.Initialise());
+    EXPECT_FALSE(statuses.filter(QStringLiteral("WinsockError: ")).isEmpty());
+    EXPECT_TRUE(statuses.filter(QStringLiteral("Connected to ")).isEmpty());
+
+    web.SetRemoteHost(server.HostPort());
     QElapsedTimer timer;
     timer.start();
     EXPECT_FALSE(web.Initialise());
@@ -275,13 +279,6 @@ TEST_F(WebDataTest, AServerThatNeverAnswersTimesOutUnlessCancelEndsTheWaitFirst)
     EXPECT_FALSE(web.Initialise());
     EXPECT_LT(timer.elapsed(), 10000);
     EXPECT_EQ(server.requests.size(), 2);
-}
-
-TEST_F(WebDataTest, ARefusedConnectionFailsWithTheSocketsError) {
-    web.SetRemoteHost(ScriptServer().HostPort()); // nobody listens there any more
-    EXPECT_FALSE(web.Initialise());
-    EXPECT_FALSE(statuses.filter(QStringLiteral("WinsockError: ")).isEmpty());
-    EXPECT_TRUE(statuses.filter(QStringLiteral("Connected to ")).isEmpty());
 }
 
 TEST_F(WebDataTest, ProgressRunsFromTheLocalDateToTheServiceOrFromDateAndIsClamped) {
@@ -310,8 +307,6 @@ TEST_F(WebDataTest, ProgressRunsFromTheLocalDateToTheServiceOrFromDateAndIsClamp
         EXPECT_EQ(progress.steps.front().value, c.value);
         EXPECT_EQ(progress.steps.front().text, c.text);
     }
-    EXPECT_EQ(progress.total, -1);
-    EXPECT_EQ(progress.units, QStringLiteral("Records"));
     EXPECT_EQ(progress.finished, 5);
     EXPECT_TRUE(prompter.shown.empty());
 }
@@ -327,8 +322,8 @@ TEST_F(WebDataTest, ThePasswordIsMaskedInTracesAndTheLogAndReceivedTextShowsWith
     EXPECT_TRUE(server.requests[0].contains("&pwd=s3cr3t&"));
     EXPECT_FALSE(logs.filter(QStringLiteral("&pwd=***&")).isEmpty());
     EXPECT_TRUE(logs.filter(QStringLiteral("s3cr3t")).isEmpty());
-    EXPECT_TRUE(LogBytes().contains("CTALUWebData:S>GET http://"));
-    EXPECT_TRUE(LogBytes().contains("&pwd=***&"));
+    EXPECT_TRUE(LogBytes().contains("CTALUWebData:S>GET http://" + server.HostPort().toLatin1() +
+                                    "/wd/wd.php?cmd=GETUSERFOLDERS&user=U&pwd=***&"));
     EXPECT_FALSE(LogBytes().contains("s3cr3t"));
     EXPECT_TRUE(shown.contains(QStringLiteral("a|b|c|d|e\nOK\n")));
     EXPECT_FALSE(shown.contains(QLatin1Char('\r')));

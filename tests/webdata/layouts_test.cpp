@@ -45,15 +45,12 @@ TEST_F(Layouts, EveryLayoutReadsTheDateOfAFilesLastLine) {
         {kDecagon, "x,2312,600", MakeDate(2006, 5, 1, 10, 0)},
         {kTeksmart, "2006-05-01 10:20:30,12.5", MakeDate(2006, 5, 1, 10, 20, 30)},
     };
-    web.EnableLog(3, 1);
     for (const auto& c : cases) {
         // Lines end at CR alone, LF or CR LF; empty lines at the end are skipped.
         EXPECT_EQ(LastDate("2000-01-01 00:00:00,1\r" + c.line.toUtf8() + "\n\r\n\n", c.type),
                   FormatDateLong(c.date))
             << c.line.toStdString();
     }
-    EXPECT_TRUE(
-        logs.contains(QStringLiteral("D>TekSmart:2006-05-01 10:20:30 -> 2006-05-01 10:20:30")));
     EXPECT_TRUE(prompter.shown.empty());
 }
 
@@ -109,7 +106,6 @@ TEST_F(Layouts, AFileWithNothingToReadGivesADash) {
               QStringLiteral("-"));
     EXPECT_EQ(web.LastDateInFile(data, 0, 0, kDateTime, 0), QStringLiteral("-"));
     EXPECT_EQ(web.LastDateInFile(data, 0, 7, kDateTime, 1), QString());
-    EXPECT_GE(busy.pushes, 5);
     EXPECT_EQ(busy.depth, 0);
 }
 
