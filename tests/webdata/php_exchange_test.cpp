@@ -13,17 +13,14 @@ TEST_F(WebDataTest, PhpsWebServerGivesTheRightUserOnlyTheRecordsAfterTheLocalLas
     const QString php = QStandardPaths::findExecutable(QStringLiteral("php"));
     if (php.isEmpty()) GTEST_SKIP() << "php is not installed";
     clock.SetWaits(WaitLengths{}); // the full reply gap: PHP may be slow to start
-    QFile script(QStringLiteral(WEBDATA_PHP_SCRIPT));
-    ASSERT_TRUE(script.open(QIODevice::ReadOnly));
-    home.Write(QStringLiteral("www/wd/wd.php"), script.readAll());
     const QByteArray records = "2006-05-01 10:00:00,1\n2006-05-01 10:10:00,2\n"
                                "2006-05-01 10:20:00,3\n2006-05-01 10:30:00,4\n";
-    home.Write(QStringLiteral("www/wd/data/site1.dat"), records);
+    home.Write(QStringLiteral("data/site1.dat"), records);
 
     const QString address = ScriptServer().HostPort(); // a port nobody listens on
     QProcess service;
     service.setStandardErrorFile(QProcess::nullDevice());
-    service.start(php, {"-S", address, "-t", home.File(QStringLiteral("www"))});
+    service.start(php, {"-S", address, "-t", home.Path(), QStringLiteral(WEBDATA_PHP_SCRIPT)});
     const auto stop = qScopeGuard([&] {
         service.kill();
         service.waitForFinished();
