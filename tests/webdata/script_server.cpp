@@ -9,16 +9,6 @@
 
 namespace quorvel::testing {
 
-Step Send(const QByteArray& bytes) {
-    return {Step::kSend, bytes};
-}
-Step Pause(int ms) {
-    return {Step::kPause, {}, ms};
-}
-Step CloseConnection() {
-    return {Step::kClose, {}};
-}
-
 QByteArray HttpReply(const QByteArray& body, const QByteArray& extraHeaders) {
     return "HTTP/1.1 200 OK\r\nContent-Type: text/plain\r\nContent-Length: " +
            QByteArray::number(body.size()) + "\r\n" + extraHeaders + "\r\n" + body;

@@ -20,9 +20,9 @@ struct Step {
 };
 using Reply = std::vector<Step>;
 
-Step Send(const QByteArray& bytes);
-Step Pause(int ms);
-Step CloseConnection();
+inline const auto Send = [](const QByteArray& bytes) { return Step{Step::kSend, bytes}; };
+inline const auto Pause = [](int ms) { return Step{Step::kPause, {}, ms}; };
+inline const auto CloseConnection = [] { return Step{Step::kClose, {}}; };
 
 // "HTTP/1.1 200 OK", a Content-Length and the given extra header lines, then body.
 QByteArray HttpReply(const QByteArray& body, const QByteArray& extraHeaders = {});
