@@ -2,7 +2,6 @@
 // framing, reuse and loss of the connection, and what reaches the data file.
 #include "webdata_fixture.h"
 
-#include <QElapsedTimer>
 #include <QTimer>
 
 namespace quorvel::testing {
@@ -11,6 +10,7 @@ namespace {
 const QByteArray kRecord1 = "2006-05-01 10:30:00,1.5";
 const QByteArray kRecord2 = "2006-05-01 10:40:00,2.5";
 const QByteArray kTwoRecords = kRecord1 + "\r\n" + kRecord2 + "\r\n";
+const QByteArray kFolders = HttpReply("a|b|c|d|e\r\nOK\r\n");
 
 TEST_F(WebDataTest, RequestsAreByteExactWithAddressHostAndEscapedValues) {
     web.SetPassword(QStringLiteral("P&q w"));
@@ -27,97 +27,127 @@ TEST_F(WebDataTest, RequestsAreByteExactWithAddressHostAndEscapedValues) {
               "GET http://" + host + "/wd/wd.php?cmd=GETLASTDATE&" + query + tail);
     EXPECT_EQ(server.requests[1], "GET http://" + host + "/wd/wd.php?cmd=GETDATA&" + query +
                                       "&date=2006-05-01%2010%3A20%3A30" + tail);
+
+    // A file missing here asks for everything and is created.
+    const QString missing = home.File(QStringLiteral("new.dat"));
+    QueueNewData("OK NO FILE yet", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+    EXPECT_TRUE(web.GetNewData(missing, 2, 1));
+    EXPECT_TRUE(server.requests.last().contains("&filelocation=2&date=0 HTTP/1.1"));
+    EXPECT_EQ(home.Read(QStringLiteral("new.dat")), kTwoRecords);
+    EXPECT_EQ(web.ServerLastDate(), 0);
+    EXPECT_TRUE(statuses.contains(QStringLiteral("Data in: ") + missing));
+    EXPECT_EQ(busy.depth, 0);
 }
 
-TEST_F(WebDataTest, AFileMissingLocallyAsksForEverythingAndIsCreated) {
-    const QString file = home.File(QStringLiteral("new.dat"));
-    QueueNewData("OK NO FILE yet", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+struct DataCase {
+    const char* what;
+    bool ok;
+    QByteArray before; // the file's bytes before; empty: no file
+    QByteArray after;  // empty: still no file
+    const char* error; // the start of LastError()
+    Reply reply;       // to GETDATA
+};
 
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-
-    ASSERT_EQ(server.requests.size(), 2);
-    EXPECT_TRUE(server.requests[1].contains("&date=0 HTTP/1.1"));
-    EXPECT_EQ(FileBytes(QStringLiteral("new.dat")), kTwoRecords);
-    EXPECT_EQ(web.ServerLastDate(), 0);
-    EXPECT_EQ(finished.last(), QStringLiteral("OK"));
-    EXPECT_TRUE(statuses.contains(QStringLiteral("Data in: ") + file));
-    EXPECT_EQ(busy.depth, 0);
+TEST_F(WebDataTest, AReplyLeavesExactlyItsWholeRecordsInTheFile) {
+    const QByteArray head = "HTTP/1.1 200 OK\r\n\r\n";
+    const int half = int(kGap.count()) / 2;
+    const QByteArray undated = "2006-05-01 10:20:30,1\r\nnot a date,2\r\n";
+    const QByteArray unended = "2006-05-01 10:20:30,1";
+    const std::vector<DataCase> cases = {
+        {"bare LF", true, "", kTwoRecords, "OK",
+         Reply{Send("HTTP/1.1 200 OK\nA: b\n\n" + kRecord1 + "\n" + kRecord2 + "\nOK\n")}},
+        {"notices and empty lines", true, "", kTwoRecords + "ok lower case\r\n", "OKAY",
+         Reply{Send(HttpReply(kRecord1 + "\r\nphp notice: x\r\n" + kRecord2 +
+                              "\nPhP Warning\r\n\r\nok lower case\r\nOKAY\r\n"))}},
+        {"no data lines", true, "", "", "No new data", Reply{Send(HttpReply("OK\r\n"))}},
+        {"closed mid-record", false, "", kRecord1 + "\r\n", "",
+         Reply{Send(head + kRecord1 + "\r\n2006-05-01 10:4"), CloseConnection()}},
+        {"endless line", false, "", "", "Received more than 1 MiB without a line end",
+         Reply{Send(head + QByteArray(1100 * 1024, 'x'))}},
+        {"chunked body ends the last line", true, "", kRecord1 + "\r\n", "OK",
+         Reply{Send(ChunkedReply(kRecord1 + "\r\nOK", {4}))}},
+        // Together the pauses outlast the time-out; each alone is well within it.
+        {"slow arrivals", true, "", kTwoRecords, "OK",
+         Reply{Send(head), Pause(half), Send(kRecord1 + "\r\n"), Pause(half),
+               Send(kRecord2 + "\r\n"), Pause(half), Send("OK\r\n")}},
+        {"local file without a last line end", true, unended, unended + "\r\n" + kRecord1 + "\r\n",
+         "OK", Reply{Send(HttpReply(kRecord1 + "\r\nOK\r\n"))}},
+        // Asking from date 0 would append everything the service has again.
+        {"local file whose last record has no date", false, undated, undated,
+         "No date in the last record of ", Reply{Send(HttpReply(kTwoRecords + "OK\r\n"))}},
+    };
+    for (std::size_t i = 0; i < cases.size(); ++i) {
+        const DataCase& c = cases[i];
+        SCOPED_TRACE(c.what);
+        const QString name = QStringLiteral("%1.dat").arg(i);
+        const QString file = c.before.isEmpty() ? home.File(name) : home.Write(name, c.before);
+        server.replies.clear();
+        QueueNewData("OK 2006-05-03 00:00:00", c.reply);
+        EXPECT_EQ(web.GetNewData(file, 1, 1), c.ok);
+        EXPECT_EQ(QFile::exists(file), !c.after.isEmpty());
+        EXPECT_EQ(home.Read(name), c.after);
+        EXPECT_TRUE(web.LastError().startsWith(QLatin1String(c.error)));
+    }
+    // Only the closed connection and the one given up on the endless line were replaced.
+    EXPECT_EQ(server.connections, 3);
 }
 
 TEST_F(WebDataTest, RecordsSurviveASplitAtEveryByteOfTheReply) {
     const QByteArray reply = HttpReply(kTwoRecords + "OK\r\n");
     for (int at = 1; at < reply.size(); ++at) {
+        SCOPED_TRACE(at);
         const QString name = QStringLiteral("split%1.dat").arg(at);
         const QString file = home.Write(name, "2006-05-01 10:00:00,0\r\n");
         QueueNewData("OK 0", SplitAt(reply, {at}));
-        ASSERT_TRUE(web.GetNewData(file, 1, 1)) << "split at " << at;
-        ASSERT_EQ(FileBytes(name), "2006-05-01 10:00:00,0\r\n" + kTwoRecords) << "split at " << at;
+        ASSERT_TRUE(web.GetNewData(file, 1, 1));
+        ASSERT_EQ(home.Read(name), "2006-05-01 10:00:00,0\r\n" + kTwoRecords);
     }
     EXPECT_EQ(server.connections, 1);
 }
 
-TEST_F(WebDataTest, ACrLfPairArrivingApartEndsTheLineOnce) {
-    const QByteArray reply = HttpReply(kTwoRecords + "OK\r\n");
-    const int blank = reply.indexOf("\r\n\r\n");
-    const int record1End = reply.indexOf(kRecord1) + kRecord1.size();
-    const int record2End = reply.indexOf(kRecord2) + kRecord2.size();
-    // Between CR and LF of the last header, of the blank line and of both records.
-    QueueNewData("OK 0", SplitAt(reply, {blank + 1, blank + 3, record1End + 1, record2End + 1}));
-    const QString file = home.File(QStringLiteral("crlf.dat"));
+TEST_F(WebDataTest, AChunkedReplyIsDechunkedBeforeItIsCutIntoLines) {
+    const QByteArray records = kTwoRecords + "2006-05-01 10:50:00,3.5\r\n";
+    const QByteArray reply = ChunkedReply(records + "OK\r\n", {5, 17, 1, 2, 30, 3});
+    // Chunk boundaries, and arrivals, fall inside lines and inside chunk-size lines.
+    QueueNewData("OK 0", SplitAt(reply, {reply.indexOf("\r\n\r\n") + 7, reply.size() - 9,
+                                         reply.size() - 3}));
+    server.Queue(kFolders);
+    const QString file = home.File(QStringLiteral("chunked.dat"));
 
     EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("crlf.dat")), kTwoRecords);
+    EXPECT_EQ(home.Read(QStringLiteral("chunked.dat")), records);
+    // The last chunk and its blank line were taken: the connection serves the next reply.
+    EXPECT_TRUE(web.Initialise());
+    EXPECT_EQ(server.connections, 1);
+    EXPECT_TRUE(statuses.filter(QStringLiteral("HTTP header reply")).isEmpty());
 }
 
-TEST_F(WebDataTest, AReplyWithBareLineFeedsIsReadLikeCrLf) {
-    const QByteArray body = kRecord1 + "\n" + kRecord2 + "\nOK\n";
-    QueueNewData("OK 0", {Send("HTTP/1.1 200 OK\nContent-Length: " +
-                               QByteArray::number(body.size()) + "\n\n" + body)});
-    const QString file = home.File(QStringLiteral("lf.dat"));
-
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("lf.dat")), kTwoRecords);
-}
-
-TEST_F(WebDataTest, PhpNoticesAndEmptyLinesNeverReachTheFile) {
-    const QByteArray body = kRecord1 + "\r\nphp notice: x\r\n" + kRecord2 +
-                            "\nPhP Warning\r\n\r\n" + "ok lower case\r\nOKAY\r\n";
-    QueueNewData("OK 0", {Send(HttpReply(body))});
-    const QString file = home.File(QStringLiteral("php.dat"));
-
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("php.dat")), kTwoRecords + "ok lower case\r\n");
-    EXPECT_EQ(finished.last(), QStringLiteral("OKAY"));
-}
-
-TEST_F(WebDataTest, ContinueThenOkIsWaitedThrough) {
+TEST_F(WebDataTest, ContinueIsWaitedThroughAndAnHttpErrorFailsTheCommand) {
     web.EnableLog(3, 1);
     server.Queue("HTTP/1.1 100 Continue\r\n\r\n" + HttpReply("OK 2006-05-02 10:00:00\r\n"));
+    server.Queue("HTTP/1.1 404 Not Found\r\nContent-Length: 4\r\n\r\nOK\r\n");
 
     EXPECT_EQ(web.LastDateInFile(QStringLiteral("d/site1.dat"), 2, 1, 1, 1),
               QStringLiteral("2 May 2006 10:00:00"));
     EXPECT_TRUE(
         logs.contains(QStringLiteral("D>ReplyCode=100 - wait HTTPState:0 |HTTP/1.1 100 Continue")));
-    EXPECT_TRUE(statuses.contains(
-        QStringLiteral("Empty line when expecting HTTP header reply HTTPState:0")));
-    ASSERT_EQ(server.requests.size(), 1);
     EXPECT_TRUE(server.requests[0].contains("file=site1%2Edat&dt=1&filelocation=2 "));
-}
-
-TEST_F(WebDataTest, AnHttpErrorIsReportedAndTheCommandFails) {
-    server.Queue("HTTP/1.1 404 Not Found\r\nContent-Length: 4\r\n\r\nOK\r\n");
 
     EXPECT_EQ(web.LastDateInFile(QStringLiteral("site1.dat"), 2, 1, 1, 1), QStringLiteral("-"));
     EXPECT_TRUE(statuses.contains(QStringLiteral("HTTP/1.1 404 Not Found")));
     EXPECT_TRUE(LogBytes().contains(
         "CTALUWebData:A-error> ReplyCode=404 - error HTTPState:0 |HTTP/1.1 404 Not Found"));
-    EXPECT_TRUE(finished.isEmpty());
+    EXPECT_EQ(finished.size(), 1);
 }
 
 TEST_F(WebDataTest, NokNamesTheCommandAndTouchesNoFile) {
-    QueueNewData("OK 0", {Send(HttpReply("NOK file unknown\r\n"))});
     const QString file = home.File(QStringLiteral("nok.dat"));
+    server.Queue(HttpReply("NOK bad user\r\n"));
+    EXPECT_FALSE(web.GetNewData(file, 1, 1));
+    EXPECT_EQ(web.LastError(), QStringLiteral("NOK bad user (GETLASTDATE)"));
+    EXPECT_EQ(server.requests.size(), 1);
 
+    QueueNewData("OK 0", {Send(HttpReply("NOK file unknown\r\n"))});
     EXPECT_FALSE(web.GetNewData(file, 1, 1));
     EXPECT_EQ(web.LastError(), QStringLiteral("NOK file unknown (GETDATA)"));
     EXPECT_EQ(finished.last(), web.LastError());
@@ -125,37 +155,14 @@ TEST_F(WebDataTest, NokNamesTheCommandAndTouchesNoFile) {
     EXPECT_FALSE(QFile::exists(file));
 }
 
-TEST_F(WebDataTest, AFailedLastDateStopsBeforeAskingForData) {
-    server.Queue(HttpReply("NOK bad user\r\n"));
-    EXPECT_FALSE(web.GetNewData(home.File(QStringLiteral("x.dat")), 1, 1));
-    EXPECT_EQ(web.LastError(), QStringLiteral("NOK bad user (GETLASTDATE)"));
-    EXPECT_EQ(server.requests.size(), 1);
-}
-
-TEST_F(WebDataTest, NoDataLinesMeansNoNewDataAndAnUntouchedFile) {
-    QueueNewData("OK 0", {Send(HttpReply("OK\r\n"))});
-    const QString file = home.File(QStringLiteral("none.dat"));
-
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_FALSE(QFile::exists(file));
-    EXPECT_EQ(finished.last(), QStringLiteral("No new data"));
-    EXPECT_EQ(web.LastError(), QStringLiteral("No new data"));
-}
-
 TEST_F(WebDataTest, UserFoldersNeedFiveItems) {
     server.Queue(HttpReply("uf|ucf|more|udf|Ann Smith|ignored\r\nOK\r\n"));
-    ASSERT_TRUE(web.Initialise());
-    EXPECT_EQ(web.UserFolder(), QStringLiteral("uf"));
-    EXPECT_EQ(web.UserCurrentFolder(), QStringLiteral("ucf"));
-    EXPECT_EQ(web.UserDataFolder(), QStringLiteral("udf"));
-    EXPECT_EQ(web.UserName(), QStringLiteral("Ann Smith"));
-
     server.Queue(HttpReply("a|b|c\r\nOK\r\n"));
+    ASSERT_TRUE(web.Initialise());
     EXPECT_TRUE(web.Initialise());
-    EXPECT_EQ(web.UserFolder(), QStringLiteral("uf"));
-    EXPECT_EQ(web.UserName(), QStringLiteral("Ann Smith"));
-    EXPECT_TRUE(
-        server.requests[1].contains("cmd=GETUSERFOLDERS&user=U&pwd=P&dt=0&filelocation=0 "));
+    EXPECT_EQ((QStringList{web.UserFolder(), web.UserCurrentFolder(), web.UserDataFolder(),
+                           web.UserName()}),
+              (QStringList{"uf", "ucf", "udf", "Ann Smith"}));
 }
 
 TEST_F(WebDataTest, TraceServerModeSavesNothingButFinishes) {
@@ -171,48 +178,48 @@ TEST_F(WebDataTest, TraceServerModeSavesNothingButFinishes) {
     EXPECT_EQ(finished.last(), QStringLiteral("OK"));
 }
 
-TEST_F(WebDataTest, ASecondCommandReusesTheOpenConnection) {
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
+TEST_F(WebDataTest, TheOpenConnectionServesNewHostsAndTheSameUserButNotANewUser) {
+    for (int i = 0; i < 4; ++i)
+        server.Queue(kFolders);
     ASSERT_TRUE(web.Initialise());
     statuses.clear();
     ASSERT_TRUE(web.Initialise());
-
-    EXPECT_EQ(server.connections, 1);
     EXPECT_TRUE(statuses.contains(QStringLiteral("Connected to ") + server.HostPort()));
     EXPECT_FALSE(statuses.contains(QStringLiteral("Connecting to ") + server.HostPort()));
-}
 
-TEST_F(WebDataTest, ANewHostTravelsOverTheOpenConnection) {
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    ASSERT_TRUE(web.Initialise());
     web.SetRemoteHost(QStringLiteral("other.example"));
+    web.SetUserID(QStringLiteral("U"));
+    web.SetPassword(QString());
     ASSERT_TRUE(web.Initialise());
+    EXPECT_TRUE(
+        server.requests[2].startsWith("GET http://other.example/wd/wd.php?cmd=GETUSERFOLDERS"
+                                      "&user=U&dt=0&filelocation=0 HTTP/1.1\r\n"
+                                      "Host: other.example\r\n"));
     EXPECT_EQ(server.connections, 1);
-    EXPECT_TRUE(server.requests[1].startsWith("GET http://other.example/wd/wd.php?"));
-    EXPECT_TRUE(server.requests[1].contains("\r\nHost: other.example\r\n"));
+
+    web.SetRemoteHost(server.HostPort());
+    web.SetUserID(QStringLiteral("V"));
+    EXPECT_EQ(socket.State(), kSocketClosed);
+    ASSERT_TRUE(web.Initialise());
+    EXPECT_EQ(server.connections, 2);
 }
 
-TEST_F(WebDataTest, AServerThatClosesBetweenCommandsIsReconnected) {
-    server.Queue(Reply{Send(HttpReply("a|b|c|d|e\r\nOK\r\n")), CloseConnection()});
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    ASSERT_TRUE(web.Initialise());
-    ASSERT_TRUE(PumpUntil([&] { return socket.State() != kSocketConnected; }));
-    statuses.clear();
-
-    EXPECT_TRUE(web.Initialise());
-    EXPECT_EQ(server.connections, 2);
-    EXPECT_TRUE(statuses.contains(QStringLiteral("Connecting to ") + server.HostPort()));
-}
-
-TEST_F(WebDataTest, ConnectionCloseInTheHeadIsHonouredAtOnce) {
-    // The server announces the close but has not closed yet when the next command starts.
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n", "Connection: close\r\n"));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    ASSERT_TRUE(web.Initialise());
-    EXPECT_TRUE(web.Initialise());
-    EXPECT_EQ(server.connections, 2);
+TEST_F(WebDataTest, AConnectionTheServerEndsIsOpenedAnewForTheNextCommand) {
+    const std::vector<Reply> endings = {
+        {Send(kFolders), CloseConnection()},
+        // Announced, but not yet done when the next command starts.
+        {Send(HttpReply("a|b|c|d|e\r\nOK\r\n", "Connection: close\r\n"))}};
+    for (const Reply& ending : endings) {
+        server.Queue(ending);
+        server.Queue(kFolders);
+        ASSERT_TRUE(web.Initialise());
+        const int opened = server.connections;
+        ASSERT_TRUE(PumpUntil([&] { return socket.State() != kSocketConnected; }));
+        statuses.clear();
+        EXPECT_TRUE(web.Initialise());
+        EXPECT_EQ(server.connections, opened + 1);
+        EXPECT_TRUE(statuses.contains(QStringLiteral("Connecting to ") + server.HostPort()));
+    }
 }
 
 TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
@@ -222,7 +229,7 @@ TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     const QString first = home.File(QStringLiteral("first.dat"));
     EXPECT_FALSE(web.GetNewData(first, 1, 1));
     // Closed when the wait ended: complete on disk already.
-    EXPECT_EQ(FileBytes(QStringLiteral("first.dat")), kTwoRecords);
+    EXPECT_EQ(home.Read(QStringLiteral("first.dat")), kTwoRecords);
 
     const QByteArray other = "2006-06-01 00:00:00,9\r\n";
     QueueNewData("OK 0", {Send(HttpReply(other + "OK\r\n"))});
@@ -231,52 +238,9 @@ TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     ASSERT_TRUE(PumpUntil([&] { return server.sends == 5; }));
     QCoreApplication::processEvents();
 
-    EXPECT_EQ(FileBytes(QStringLiteral("first.dat")), kTwoRecords);
-    EXPECT_EQ(FileBytes(QStringLiteral("second.dat")), other);
+    EXPECT_EQ(home.Read(QStringLiteral("first.dat")), kTwoRecords);
+    EXPECT_EQ(home.Read(QStringLiteral("second.dat")), other);
     EXPECT_EQ(server.connections, 2);
-}
-
-TEST_F(WebDataTest, AConnectionClosedMidRecordKeepsOnlyWholeRecords) {
-    QueueNewData("OK 0", {Send("HTTP/1.1 200 OK\r\n\r\n" + kRecord1 + "\r\n2006-05-01 10:4"),
-                          CloseConnection()});
-    const QString file = home.File(QStringLiteral("cut.dat"));
-
-    EXPECT_FALSE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("cut.dat")), kRecord1 + "\r\n");
-}
-
-TEST_F(WebDataTest, AChunkedReplyIsDechunkedBeforeItIsCutIntoLines) {
-    const QByteArray records = kTwoRecords + "2006-05-01 10:50:00,3.5\r\n";
-    const QByteArray reply = ChunkedReply(records + "OK\r\n", {5, 17, 1, 2, 30, 3});
-    // Chunk boundaries, and arrivals, fall inside lines and inside chunk-size lines.
-    QueueNewData("OK 0", SplitAt(reply, {reply.indexOf("\r\n\r\n") + 7, reply.size() - 9,
-                                         reply.size() - 3}));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    const QString file = home.File(QStringLiteral("chunked.dat"));
-
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("chunked.dat")), records);
-    // The last chunk and its blank line were taken: the connection serves the next reply.
-    EXPECT_TRUE(web.Initialise());
-    EXPECT_EQ(server.connections, 1);
-    EXPECT_TRUE(statuses.filter(QStringLiteral("HTTP header reply")).isEmpty());
-}
-
-TEST_F(WebDataTest, TheEndOfAChunkedBodyEndsItsLastLine) {
-    QueueNewData("OK 0", {Send(ChunkedReply(kRecord1 + "\r\nOK", {4}))});
-    const QString file = home.File(QStringLiteral("tail.dat"));
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("tail.dat")), kRecord1 + "\r\n");
-}
-
-TEST_F(WebDataTest, EveryArrivalPushesTheTimeOutBack) {
-    const int gap = int(kGap.count());
-    // Together the pauses last longer than the time-out; each alone is well within it.
-    QueueNewData("OK 0", {Send("HTTP/1.1 200 OK\r\n\r\n"), Pause(gap / 2), Send(kRecord1 + "\r\n"),
-                          Pause(gap / 2), Send(kRecord2 + "\r\n"), Pause(gap / 2), Send("OK\r\n")});
-    const QString file = home.File(QStringLiteral("slow.dat"));
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(FileBytes(QStringLiteral("slow.dat")), kTwoRecords);
 }
 
 TEST_F(WebDataTest, AnUnwritableFileIsReportedAndTheCommandFails) {
@@ -291,7 +255,13 @@ TEST_F(WebDataTest, AnUnwritableFileIsReportedAndTheCommandFails) {
     EXPECT_FALSE(QFile::exists(file));
 }
 
-TEST_F(WebDataTest, AServerThatNeverAnswersTimesOut) {
+TEST_F(WebDataTest, ARefusedConnectionFailsASilentServerTimesOutAndCancelEndsTheWait) {
+    web.SetRemoteHost(ScriptServer().HostPort()); // nobody listens there any more
+    EXPECT_FALSE(web.Initialise());
+    EXPECT_FALSE(statuses.filter(QStringLiteral("WinsockError: ")).isEmpty());
+    EXPECT_TRUE(statuses.filter(QStringLiteral("Connected to ")).isEmpty());
+
+    web.SetRemoteHost(server.HostPort());
     QElapsedTimer timer;
     timer.start();
     EXPECT_FALSE(web.Initialise());
@@ -299,131 +269,64 @@ TEST_F(WebDataTest, AServerThatNeverAnswersTimesOut) {
     EXPECT_EQ(server.requests.size(), 1);
     EXPECT_TRUE(finished.isEmpty());
     EXPECT_EQ(busy.depth, 0);
-}
 
-TEST_F(WebDataTest, CancelEndsTheWaitAtOnce) {
-    WaitLengths waits;
-    waits.replyGap = std::chrono::seconds(20);
-    clock.SetWaits(waits);
+    clock.SetWaits(WaitLengths{.replyGap = std::chrono::seconds(20)});
     QObject::connect(&web, &CTALUWebData::ShowStatus, [&](const QString& text) {
         if (text.startsWith(QStringLiteral("Connected to ")))
             QTimer::singleShot(10, [&] { web.SetUserCancel(1); });
     });
-    QElapsedTimer timer;
-    timer.start();
+    timer.restart();
     EXPECT_FALSE(web.Initialise());
     EXPECT_LT(timer.elapsed(), 10000);
+    EXPECT_EQ(server.requests.size(), 2);
 }
 
-TEST_F(WebDataTest, ARefusedConnectionFailsWithTheSocketsError) {
-    quint16 closedPort = 0;
-    {
-        QTcpServer probe;
-        probe.listen(QHostAddress::LocalHost, 0);
-        closedPort = probe.serverPort();
+TEST_F(WebDataTest, ProgressRunsFromTheLocalDateToTheServiceOrFromDateAndIsClamped) {
+    struct Case {
+        QStringList fromDates;
+        QByteArray lastDate, record;
+        QString step; // percent and date shown for the record
+    };
+    const std::vector<Case> cases = {
+        {{}, "OK 2006-05-03", "2006-05-02,5", "50 2 May 2006 00:00:00"},
+        {{}, "OK 2006-05-03", "2007-01-01,5", "100 1 Jan 2007 00:00:00"},
+        {{}, "OK 2008-01-03", "garbage,5", "0 -"},
+        // A text that is no date clears the switch.
+        {{"2006-05-05", "not a date"}, "OK 2006-05-03", "2006-05-03,5", "100 3 May 2006 00:00:00"},
+        {{"2006-05-05"}, "OK 2006-05-03", "2006-05-03,5", "50 3 May 2006 00:00:00"}};
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.record.toStdString());
+        const QString file = home.Write(QStringLiteral("p.dat"), "2006-05-01 00:00:00,1\r\n");
+        web.SetFromDate(0, QStringLiteral("2006-05-02")); // not asked for: no effect
+        for (const QString& from : c.fromDates)
+            web.SetFromDate(1, from);
+        QueueNewData(c.lastDate, {Send(HttpReply(c.record + "\r\nOK\r\n"))});
+        ASSERT_TRUE(web.GetNewData(file, 1, 1));
+        ASSERT_FALSE(progress.steps.empty());
+        EXPECT_EQ(QString::number(progress.steps.front().value) + QLatin1Char(' ') +
+                      progress.steps.front().text,
+                  c.step);
     }
-    web.SetRemoteHost(QStringLiteral("127.0.0.1:") + QString::number(closedPort));
-    EXPECT_FALSE(web.Initialise());
-    EXPECT_FALSE(statuses.filter(QStringLiteral("WinsockError: ")).isEmpty());
-    EXPECT_TRUE(statuses.filter(QStringLiteral("Connected to ")).isEmpty());
-}
-
-TEST_F(WebDataTest, AnEndlessLineEndsTheCommandInsteadOfGrowingMemory) {
-    QueueNewData("OK 0", {Send("HTTP/1.1 200 OK\r\n\r\n" + QByteArray(1100 * 1024, 'x'))});
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    const QString file = home.File(QStringLiteral("long.dat"));
-
-    EXPECT_FALSE(web.GetNewData(file, 1, 1));
-    EXPECT_TRUE(web.LastError().contains(QStringLiteral("1 MiB")));
-    EXPECT_FALSE(QFile::exists(file));
-    EXPECT_TRUE(web.Initialise());
-    EXPECT_EQ(server.connections, 2);
-}
-
-TEST_F(WebDataTest, RecordsJoinAFileWhoseLastLineLacksItsEnd) {
-    const QString file = home.Write(QStringLiteral("open.dat"), "2006-05-01 10:20:30,1");
-    QueueNewData("OK 0", {Send(HttpReply(kRecord1 + "\r\nOK\r\n"))});
-
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_TRUE(server.requests[1].contains("date=2006-05-01%2010%3A20%3A30 "));
-    EXPECT_EQ(FileBytes(QStringLiteral("open.dat")),
-              "2006-05-01 10:20:30,1\r\n" + kRecord1 + "\r\n");
-}
-
-TEST_F(WebDataTest, AFileWhoseLastRecordHasNoDateIsNotFetchedAgain) {
-    const QByteArray content = "2006-05-01 10:20:30,1\r\nnot a date,2\r\n";
-    const QString file = home.Write(QStringLiteral("undated.dat"), content);
-    QueueNewData("OK 2006-05-03 00:00:00", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
-
-    EXPECT_FALSE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(server.requests.size(), 1);
-    EXPECT_TRUE(web.LastError().startsWith(QStringLiteral("No date in the last record of ")));
-    EXPECT_EQ(FileBytes(QStringLiteral("undated.dat")), content);
-}
-
-TEST_F(WebDataTest, ProgressRunsFromTheLocalToTheServiceDateAndIsClamped) {
-    const QString file = home.Write(QStringLiteral("p.dat"), "2006-05-01 00:00:00,1\r\n");
-    QueueNewData("OK 2006-05-03 00:00:00", {Send(HttpReply("2006-05-02 00:00:00,5\r\nOK\r\n"))});
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    EXPECT_EQ(progress.total, -1);
-    EXPECT_EQ(progress.units, QStringLiteral("Records"));
-    ASSERT_FALSE(progress.steps.empty());
-    EXPECT_EQ(progress.steps.front().value, 50);
-    EXPECT_EQ(progress.steps.front().text, QStringLiteral("2 May 2006 00:00:00"));
-    EXPECT_EQ(progress.finished, 1);
-
-    // A record beyond the service's date, and one whose date cannot be read.
-    QueueNewData("OK 2006-05-03 00:00:00", {Send(HttpReply("2007-01-01 00:00:00,5\r\nOK\r\n"))});
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    ASSERT_FALSE(progress.steps.empty());
-    EXPECT_EQ(progress.steps.front().value, 100);
-    QueueNewData("OK 2008-01-03 00:00:00", {Send(HttpReply("garbage,5\r\nOK\r\n"))});
-    EXPECT_TRUE(web.GetNewData(file, 1, 1));
-    ASSERT_FALSE(progress.steps.empty());
-    EXPECT_EQ(progress.steps.front().value, 0);
-    EXPECT_EQ(progress.steps.front().text, QStringLiteral("-"));
-    EXPECT_TRUE(FileBytes(QStringLiteral("p.dat")).endsWith("garbage,5\r\n"));
-    EXPECT_EQ(programEnds, 0);
+    EXPECT_EQ(progress.finished, 5);
     EXPECT_TRUE(prompter.shown.empty());
 }
 
-TEST_F(WebDataTest, ThePasswordNeverReachesATraceOrTheLog) {
+TEST_F(WebDataTest, ThePasswordIsMaskedInTracesAndTheLogAndReceivedTextShowsWithLf) {
     web.EnableLog(1, 1);
     web.SetPassword(QStringLiteral("s3cr3t"));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
+    QString shown;
+    QObject::connect(&web, &CTALUWebData::ShowReceived, [&](const QString& t) { shown += t; });
+    server.Queue(kFolders);
     ASSERT_TRUE(web.Initialise());
 
-    EXPECT_TRUE(server.requests[0].contains("pwd=s3cr3t"));
-    EXPECT_FALSE(logs.filter(QStringLiteral("pwd=***")).isEmpty());
+    EXPECT_TRUE(server.requests[0].contains("&pwd=s3cr3t&"));
+    EXPECT_FALSE(logs.filter(QStringLiteral("&pwd=***&")).isEmpty());
     EXPECT_TRUE(logs.filter(QStringLiteral("s3cr3t")).isEmpty());
-    EXPECT_TRUE(LogBytes().contains("CTALUWebData:S>GET http://"));
+    EXPECT_TRUE(LogBytes().contains("CTALUWebData:S>GET http://" + server.HostPort().toLatin1() +
+                                    "/wd/wd.php?cmd=GETUSERFOLDERS&user=U&pwd=***&"));
     EXPECT_FALSE(LogBytes().contains("s3cr3t"));
-}
-
-TEST_F(WebDataTest, ANewUserClosesTheConnectionButTheSameOneDoesNot) {
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    ASSERT_TRUE(web.Initialise());
-    web.SetUserID(QStringLiteral("U"));
-    web.SetPassword(QString());
-    EXPECT_EQ(socket.State(), kSocketConnected);
-    ASSERT_TRUE(web.Initialise());
-    EXPECT_TRUE(server.requests[1].contains("user=U&dt=0"));
-    web.SetUserID(QStringLiteral("V"));
-    EXPECT_EQ(socket.State(), kSocketClosed);
-    ASSERT_TRUE(web.Initialise());
-    EXPECT_EQ(server.connections, 2);
-}
-
-TEST_F(WebDataTest, ReceivedTextIsShownWithPlainLineFeeds) {
-    QStringList shown;
-    QObject::connect(&web, &CTALUWebData::ShowReceived, [&](const QString& t) { shown << t; });
-    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
-    ASSERT_TRUE(web.Initialise());
-    ASSERT_FALSE(shown.isEmpty());
-    EXPECT_TRUE(shown.join(QString()).contains(QStringLiteral("a|b|c|d|e\nOK\n")));
-    EXPECT_FALSE(shown.join(QString()).contains(QLatin1Char('\r')));
+    EXPECT_TRUE(shown.contains(QStringLiteral("a|b|c|d|e\nOK\n")));
+    EXPECT_FALSE(shown.contains(QLatin1Char('\r')));
 }
 
 } // namespace

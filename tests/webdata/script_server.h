@@ -1,29 +1,28 @@
 #pragma once
-// A loopback HTTP peer whose answers are scripted byte by byte: it can split a
+// A loopback HTTP peer whose answers are scripted step by step: it can split a
 // reply anywhere, pause, close mid-reply or never answer.
 
 #include <QByteArray>
 #include <QList>
-#include <QObject>
 #include <QTcpServer>
-#include <QTcpSocket>
 
 #include <deque>
 #include <vector>
 
+class QTcpSocket;
+
 namespace quorvel::testing {
 
 struct Step {
-    enum Kind { kSend, kPause, kClose };
-    Kind kind = kSend;
+    enum Kind { kSend, kPause, kClose } kind;
     QByteArray bytes;
     int ms = 0;
 };
 using Reply = std::vector<Step>;
 
-Step Send(const QByteArray& bytes);
-Step Pause(int ms);
-Step CloseConnection();
+inline const auto Send = [](const QByteArray& bytes) { return Step{Step::kSend, bytes}; };
+inline const auto Pause = [](int ms) { return Step{Step::kPause, {}, ms}; };
+inline const auto CloseConnection = [] { return Step{Step::kClose, {}}; };
 
 // "HTTP/1.1 200 OK", a Content-Length and the given extra header lines, then body.
 QByteArray HttpReply(const QByteArray& body, const QByteArray& extraHeaders = {});
@@ -32,36 +31,25 @@ QByteArray HttpReply(const QByteArray& body, const QByteArray& extraHeaders = {}
 QByteArray ChunkedReply(const QByteArray& body, const QList<int>& sizes);
 // Bytes sent in pieces cut at the given offsets, with a short pause between
 // pieces so that each arrives on its own.
-Reply SplitAt(const QByteArray& bytes, const QList<qsizetype>& offsets, int pauseMs = 5);
+Reply SplitAt(const QByteArray& bytes, const QList<qsizetype>& offsets);
 
 class ScriptServer : public QObject {
-    Q_OBJECT
 public:
     ScriptServer();
-    ~ScriptServer() override;
-
-    quint16 Port() const { return server_.serverPort(); }
-    QString HostPort() const;
-    // Replies go to requests in order; a request without a queued reply gets no answer.
-    void Queue(const Reply& reply) { replies_.push_back(reply); }
+    QString HostPort() const { return QStringLiteral("127.0.0.1:%1").arg(server_.serverPort()); }
+    void Queue(const Reply& reply) { replies.push_back(reply); }
     void Queue(const QByteArray& bytes) { Queue(Reply{Send(bytes)}); }
 
+    // Answers to the coming requests in order; a request finding none gets no answer.
+    std::deque<Reply> replies;
     QList<QByteArray> requests; // each request's bytes, up to and with its blank line
     int connections = 0;
     int sends = 0; // Send steps carried out
 
 private:
-    struct Peer {
-        QTcpSocket* socket;
-        QByteArray buffer;
-    };
-    void OnConnection();
-    void OnReadyRead(QTcpSocket* socket);
-    void Run(QTcpSocket* socket, Reply reply, std::size_t step);
+    void Run(QTcpSocket* socket, const Reply& reply, std::size_t step);
 
     QTcpServer server_;
-    std::deque<Reply> replies_;
-    QList<Peer> peers_;
 };
 
 } // namespace quorvel::testing

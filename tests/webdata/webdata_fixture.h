@@ -5,11 +5,14 @@
 #include "common/recorders.h"
 #include "common/temp_home.h"
 #include "script_server.h"
+#include "support/program_home.h"
 #include "webdata/talu_web_data.h"
 #include "webdata/tcp_socket_control.h"
 
 #include <QCoreApplication>
 #include <QElapsedTimer>
+#include <QFile>
+#include <QFileInfo>
 #include <QStringList>
 
 #include <gtest/gtest.h>
@@ -22,15 +25,36 @@ class WebDataTest : public ::testing::Test {
 protected:
     static constexpr std::chrono::milliseconds kGap{500};
 
-    WebDataTest();
+    WebDataTest() {
+        clock.SetWaits(WaitLengths{.replyGap = kGap});
+        web.MyWinsock(&socket);
+        web.SetRemoteHost(server.HostPort());
+        web.SetAgent(QStringLiteral("TALUQuorvel"));
+        web.SetUserID(QStringLiteral("U"));
+        web.SetPassword(QStringLiteral("P"));
+        web.SetPictureBox(&progress);
+        web.SetProgramEnder([this] { ++programEnds; });
+        QObject::connect(&web, &CTALUWebData::Finished,
+                         [this](const QString& m) { finished << m; });
+        QObject::connect(&web, &CTALUWebData::ShowStatus,
+                         [this](const QString& m) { statuses << m; });
+        QObject::connect(&web, &CTALUWebData::ShowLog, [this](const QString& m) { logs << m; });
+    }
 
-    // Reads a text file of the temporary home.
-    QByteArray FileBytes(const QString& name) const { return home.Read(name); }
-    QByteArray LogBytes() const;
+    QByteArray LogBytes() const { return home.Read(QFileInfo(ProgramHome::LogFile()).fileName()); }
     // Pumps events until pred holds or ms pass; returns pred().
-    template <typename Pred> static bool PumpUntil(Pred pred, int ms = 2000);
+    template <typename Pred> static bool PumpUntil(Pred pred, int ms = 2000) {
+        QElapsedTimer timer;
+        timer.start();
+        while (!pred() && timer.elapsed() < ms)
+            QCoreApplication::processEvents(QEventLoop::AllEvents, 10);
+        return pred();
+    }
     // Queues the GETLASTDATE answer, then the GETDATA reply.
-    void QueueNewData(const QByteArray& lastDateLine, const Reply& dataReply);
+    void QueueNewData(const QByteArray& lastDateLine, const Reply& dataReply) {
+        server.Queue(HttpReply(lastDateLine + "\r\n"));
+        server.Queue(dataReply);
+    }
 
     TempHome home;
     RecordingPrompter prompter;
@@ -44,13 +68,5 @@ protected:
     int programEnds = 0;
     QStringList finished, statuses, logs;
 };
-
-template <typename Pred> bool WebDataTest::PumpUntil(Pred pred, int ms) {
-    QElapsedTimer timer;
-    timer.start();
-    while (!pred() && timer.elapsed() < ms)
-        QCoreApplication::processEvents(QEventLoop::AllEvents, 10);
-    return pred();
-}
 
 } // namespace quorvel::testing

@@ -1,10 +1,11 @@
 <?php
 // A small stand-in for the service script, for the client's end-to-end tests.
-// Records live in the folder named by WD_DATA, one file per data file, with
-// the date and time in the first comma-separated field.
+// Run as the router of PHP's web server; records live in the folder "data" of
+// the document root, one file per data file, with the date and time in the
+// first comma-separated field.
 header('Content-Type: text/plain');
 
-$dir = getenv('WD_DATA');
+$dir = $_SERVER['DOCUMENT_ROOT'] . '/data';
 $cmd = $_GET['cmd'] ?? '';
 if (($_GET['user'] ?? '') !== 'ann' || ($_GET['pwd'] ?? '') !== 'p&ss word') {
     echo "NOK bad user\r\n";
