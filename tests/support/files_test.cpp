@@ -15,13 +15,10 @@ using quorvel::testing::TempHome;
 
 namespace {
 
-QStringList LogLines(const TempHome& home) {
+QStringList LogLines() {
     QFile log(ProgramHome::LogFile());
-    if (!log.open(QIODevice::ReadOnly))
-        return {};
-    QStringList lines = QString::fromUtf8(log.readAll()).split("\r\n", Qt::SkipEmptyParts);
-    return lines;
-    (void)home;
+    if (!log.open(QIODevice::ReadOnly)) return {};
+    return QString::fromUtf8(log.readAll()).split("\r\n", Qt::SkipEmptyParts);
 }
 
 } // namespace
@@ -60,17 +57,18 @@ TEST(CheckLocalFolders, CreatesEachMissingLevelAndLogsIt) {
     QDir().mkpath(home.File("A"));
     EXPECT_TRUE(CheckLocalFolders(home.File("A/B/C")));
     EXPECT_TRUE(FolderExists(home.File("A/B/C")));
-    const QStringList lines = LogLines(home);
+    const QStringList lines = LogLines();
     ASSERT_EQ(lines.size(), 2);
     EXPECT_TRUE(lines[0].endsWith(":Creaded folder: " + QDir::toNativeSeparators(home.File("A/B"))))
         << lines[0].toStdString();
-    EXPECT_TRUE(lines[1].endsWith("Creaded folder: " + QDir::toNativeSeparators(home.File("A/B/C"))));
+    EXPECT_TRUE(
+        lines[1].endsWith("Creaded folder: " + QDir::toNativeSeparators(home.File("A/B/C"))));
     EXPECT_TRUE(ports.prompter.shown.empty());
 
     // Everything present, a trailing separator and backslashes: nothing more to do.
     EXPECT_TRUE(CheckLocalFolders(home.File("A/B/C/")));
     EXPECT_TRUE(CheckLocalFolders(home.Path() + "\\A\\B"));
-    EXPECT_EQ(LogLines(home).size(), 2);
+    EXPECT_EQ(LogLines().size(), 2);
     EXPECT_TRUE(CheckLocalFolder(""));
 }
 

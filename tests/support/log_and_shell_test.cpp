@@ -45,9 +45,9 @@ TEST(ProgramHome, HomeSwitchMovesSettingsAndLogs) {
     ProgramHome::Configure(args);
     EXPECT_EQ(args, QStringList({"/S", "x"}));
     EXPECT_EQ(ProgramHome::Folder(), QDir::toNativeSeparators(dir.path()));
-    EXPECT_EQ(ProgramHome::SettingsFile(),
-              QDir::toNativeSeparators(dir.path()) + QDir::separator() +
-                  ProgramHome::ProgramName() + ".ini");
+    EXPECT_EQ(ProgramHome::SettingsFile(), QDir::toNativeSeparators(dir.path()) +
+                                               QDir::separator() + ProgramHome::ProgramName() +
+                                               ".ini");
     EXPECT_TRUE(ProgramHome::FtpLogFile().endsWith(QString(QDir::separator()) + "ftp.log"));
 
     qputenv("QUORVEL_HOME", QFile::encodeName(dir.filePath("env")));
@@ -93,7 +93,8 @@ TEST(ShellOpen, MessageTable) {
     EXPECT_EQ(ShellErrorText(5), QString("Path/file access error"));
     EXPECT_EQ(ShellErrorText(26), QString("A sharing violation occurred."));
     EXPECT_EQ(ShellErrorText(32), QString("The specified dynamic-link library was not found."));
-    EXPECT_EQ(ShellErrorText(17),
-              QString("An error occurred occurred whilst trying to open or print the selected file."));
+    EXPECT_EQ(
+        ShellErrorText(17),
+        QString("An error occurred occurred whilst trying to open or print the selected file."));
     EXPECT_TRUE(ShellErrorText(42).isEmpty());
 }

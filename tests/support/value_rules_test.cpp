@@ -9,8 +9,8 @@ TEST(LeadingNumber, ReadsUpToTheFirstCharacterThatCannotContinue) {
     EXPECT_DOUBLE_EQ(ValDouble(u"-3e2x"), -300.0);
     EXPECT_DOUBLE_EQ(ValDouble(u"+7"), 7.0);
     EXPECT_DOUBLE_EQ(ValDouble(u".5"), 0.5);
-    EXPECT_DOUBLE_EQ(ValDouble(u"12e"), 12.0);   // exponent without digits ends the number
-    EXPECT_DOUBLE_EQ(ValDouble(u"1.2.3"), 1.2);  // a second point cannot continue it
+    EXPECT_DOUBLE_EQ(ValDouble(u"12e"), 12.0);  // exponent without digits ends the number
+    EXPECT_DOUBLE_EQ(ValDouble(u"1.2.3"), 1.2); // a second point cannot continue it
     EXPECT_DOUBLE_EQ(ValDouble(u"--5"), 0.0);
 }
 
