@@ -2,10 +2,11 @@
 #include "transfer/ftp_session.h"
 
 #include "transfer/ftp_status_events.h"
-#include "transfer/replacing_file.h"
 
 #include <QFile>
 #include <QFileInfo>
+
+#include <QSaveFile>
 
 #include <algorithm>
 
@@ -16,7 +17,7 @@ namespace {
 constexpr int kTries = 3;
 
 struct WriteTarget {
-    ReplacingFile* file;
+    QSaveFile* file;
     QString* error;
 };
 
@@ -31,8 +32,9 @@ void RestoreDiscard(CURL* curl) {
 
 size_t WriteToFile(char* data, size_t size, size_t count, void* target) {
     auto* out = static_cast<WriteTarget*>(target);
-    if (out->file->Write(data, static_cast<qint64>(size * count))) return size * count;
-    *out->error = out->file->ErrorString();
+    const auto bytes = static_cast<qint64>(size * count);
+    if (out->file->write(data, bytes) == bytes) return size * count;
+    *out->error = out->file->errorString();
     return 0; // curl ends the transfer with a write error
 }
 
@@ -138,9 +140,9 @@ bool FtpSession::Download(const QString& remote, const QString& local) {
 // Receives into a temporary file beside the target, which replaces the target
 // only once everything arrived: a broken transfer leaves the old copy alone.
 bool FtpSession::GetOnce(const QString& remote, const QString& local) {
-    ReplacingFile file(local);
-    if (!file.Open()) {
-        detail_ = file.ErrorString();
+    QSaveFile file(local);
+    if (!file.open(QIODevice::WriteOnly)) {
+        detail_ = file.errorString();
         return false;
     }
     WriteTarget target{&file, &localError_};
@@ -152,8 +154,8 @@ bool FtpSession::GetOnce(const QString& remote, const QString& local) {
     const bool received = Perform(remote);
     if (curl_) RestoreDiscard(curl_->get());
     if (!received) return false; // the temporary file goes with `file`
-    if (!file.Commit()) {
-        detail_ = file.ErrorString();
+    if (!file.commit()) {
+        detail_ = file.errorString();
         return false;
     }
     TransferDone();

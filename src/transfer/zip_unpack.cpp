@@ -1,6 +1,5 @@
 #include "transfer/zip_archive.h"
 
-#include "transfer/replacing_file.h"
 #include "transfer/zip_codes.h"
 #include "transfer/zip_entry_path.h"
 
@@ -10,6 +9,7 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QSaveFile>
 
 #include <memory>
 #include <vector>
@@ -75,7 +75,7 @@ int ListEntries(zip_t* archive, const QString& folder, std::vector<Entry>& entri
     return kZipOk;
 }
 
-int CopyEntry(zip_file_t* in, ReplacingFile& out, const Entry& entry, const ZipProgress& progress) {
+int CopyEntry(zip_file_t* in, QSaveFile& out, const Entry& entry, const ZipProgress& progress) {
     constexpr zip_int64_t kChunk = 1 << 20;
     std::unique_ptr<char[]> buffer(new char[kChunk]);
     const QString name = QFileInfo(entry.path).fileName();
@@ -85,7 +85,7 @@ int CopyEntry(zip_file_t* in, ReplacingFile& out, const Entry& entry, const ZipP
         const zip_int64_t got = zip_fread(in, buffer.get(), kChunk);
         if (got < 0) return ReadCode(zip_file_get_error(in));
         if (got == 0) return kZipOk;
-        if (!out.Write(buffer.get(), got)) return kZipWriteProblem;
+        if (out.write(buffer.get(), got) != got) return kZipWriteProblem;
         done += static_cast<zip_uint64_t>(got);
         const int percent = entry.size == 0 ? 100 : static_cast<int>(done * 100 / entry.size);
         if (progress && percent != shown) progress(name, shown = percent);
@@ -98,11 +98,11 @@ int ExtractEntry(zip_t* archive, const Entry& entry, const ZipProgress& progress
     if (!QDir().mkpath(QFileInfo(entry.path).absolutePath())) return kZipFolderProblem;
     std::unique_ptr<zip_file_t, EntryCloser> in(zip_fopen_index(archive, entry.index, 0));
     if (!in) return ReadCode(zip_get_error(archive));
-    ReplacingFile out(entry.path);
-    if (!out.Open()) return kZipCreateProblem;
+    QSaveFile out(entry.path);
+    if (!out.open(QIODevice::WriteOnly)) return kZipCreateProblem;
     const int code = CopyEntry(in.get(), out, entry, progress);
     if (code != kZipOk) return code; // the older copy stays; the temporary file goes with `out`
-    if (!out.Commit()) return kZipWriteProblem;
+    if (!out.commit()) return kZipWriteProblem;
     if (entry.hasTime) {
         QFile done(entry.path);
         if (done.open(QIODevice::ReadWrite))
