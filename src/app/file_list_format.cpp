@@ -175,13 +175,4 @@ QStringList SplitListText(const QByteArray& bytes) {
     return lines;
 }
 
-QByteArray FormatListText(const std::vector<FileRecord>& records) {
-    QByteArray text;
-    for (const FileRecord& record : records) {
-        text += FormatFileRecordLine(record).toUtf8();
-        text += "\r\n";
-    }
-    return text;
-}
-
 } // namespace quorvel

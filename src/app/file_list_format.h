@@ -51,7 +51,4 @@ ParsedRecordLine ParseFileRecordLine(const QString& line);
 // dropped), else Latin-1; split at CR LF, LF or CR.
 QStringList SplitListText(const QByteArray& bytes);
 
-// The whole file text of the records, each line ended by CR LF.
-QByteArray FormatListText(const std::vector<FileRecord>& records);
-
 } // namespace quorvel

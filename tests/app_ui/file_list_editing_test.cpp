@@ -60,14 +60,14 @@ TEST_F(FileListEditingTest, NewWithThreeFilesPutsThemInReverseBeforeTheSelection
 TEST_F(FileListEditingTest, MovesAtBothEnds) {
     StartWith({"A", "B", "C"});
     Select(0);
-    window->DoFile(1); // up from the top: nothing to swap with
+    window->DoFile(kFileMoveUp); // up from the top: nothing to swap with
     EXPECT_EQ(ListNames(), QStringList({"A", "B", "C"}));
-    window->DoFile(2);
+    window->DoFile(kFileMoveDown);
     EXPECT_EQ(ListNames(), QStringList({"B", "A", "C"}));
     EXPECT_EQ(C().Lst_Files->currentRow(), 1);
     EXPECT_EQ(C().Txt_Name->text(), "A");
     Select(2);
-    window->DoFile(2); // down from the bottom: nothing
+    window->DoFile(kFileMoveDown); // down from the bottom: nothing
     EXPECT_EQ(ListNames(), QStringList({"B", "A", "C"}));
     C().Cmd_DoFile[1]->click();
     EXPECT_EQ(ListNames(), QStringList({"B", "C", "A"}));
