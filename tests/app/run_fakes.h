@@ -83,7 +83,7 @@ private:
     QString lastError_;
 };
 
-// Records what a run showed.
+// Records what a run showed, one line per call.
 class RecordingObserver : public RunObserver {
 public:
     void BusyChanged(bool busy) override { events << (busy ? "busy" : "idle"); }

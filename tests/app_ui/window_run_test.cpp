@@ -5,7 +5,6 @@
 
 #include "app/run/run_engine.h"
 #include "support/date_text.h"
-#include "support/ui/progress_bar.h"
 
 #include <QTcpServer>
 #include <QTimer>
@@ -30,25 +29,6 @@ protected:
         return shown;
     }
 };
-
-TEST_F(WindowRunTest, ProcessAllWalksTheListRunsTheCommandsAndStampsTheRun) {
-    UserMaintainsList();
-    WriteList({" 0 ~1~fromdate~1 Nov 2023~0~0~0~0~0~0~0~~~0", " 0 ~0~Off~off.csv~0~0~0~0~0~1~0~~~0",
-               " 0 ~1~DIR~dir.txt~0~0~0~0~0~0~0~~~0", Line("Keep", "keep.csv", 0, 0)});
-    Start();
-    C().Cmd_Process[RunEngine::kProcessAll]->click();
-    // The walk ends on the last entry, which stays selected.
-    EXPECT_EQ(C().Lst_Files->currentRow(), 3);
-    EXPECT_EQ(C().Txt_Name->text(), "Keep");
-    EXPECT_EQ(C().Txt_AfterDate->text(), "1 Nov 2023");
-    EXPECT_EQ(C().Opt_Whichdates->CheckedIndex(), 1);
-    EXPECT_TRUE(home.Read("dir.txt").startsWith("Date: "));
-    EXPECT_TRUE(IsDateText(C().Lbl_LastDownload->text()));
-    EXPECT_EQ(C().Lbl_status->text(), "Processed 3 file(s)");
-    EXPECT_TRUE(C().Pic_ProgressFile->Finished());
-    EXPECT_TRUE(ports.prompter.shown.empty());
-    EXPECT_TRUE(C().Cmd_Process[RunEngine::kProcessAll]->isEnabled());
-}
 
 TEST_F(WindowRunTest, DuringARunOnlyCancelIsOfferedAndCloseOnlyStopsTheRun) {
     StartWith({"A", "B", "C"});

@@ -5,7 +5,9 @@
 
 #include "app/run/run_engine.h"
 #include "common/reference_service.h"
+#include "support/date_text.h"
 #include "support/program_home.h"
+#include "support/ui/progress_bar.h"
 #include "transfer/ftp.h"
 #include "transfer/zip_archive.h"
 #include "transfer/zip_codes.h"
@@ -96,7 +98,8 @@ TEST_F(WindowServiceTest, AListRunsAgainstTheServiceAndASecondRunMovesOnlyWhatAl
                Record("fromdate", "1 Nov 2023", kDownloadNever, kUploadNever),
                Record("ZipDown", "zd.csv", kDownloadAlways, kUploadNever, 0, 1),
                Record("ZipUp", "zu.csv", kDownloadNever, kUploadAlways, 0, 1),
-               Record("DIR", "listing.txt", kDownloadNever, kUploadAlways)});
+               Record("DIR", "listing.txt", kDownloadNever, kUploadAlways),
+               " 0 ~0~Off~off.csv~0~2~1~0~0~1~0~~~0"});
     Start();
     SignIn();
     // The local copies' dates, as this PC's list held them.
@@ -106,7 +109,11 @@ TEST_F(WindowServiceTest, AListRunsAgainstTheServiceAndASecondRunMovesOnlyWhatAl
     }
     ProcessAll();
     EXPECT_TRUE(Boxes().isEmpty()) << Boxes().join(" | ").toStdString();
+    // Every entry was shown, the inactive last one too, but only the active ones count.
+    EXPECT_EQ(C().Lst_Files->currentRow(), 10);
     EXPECT_EQ(C().Lbl_status->text(), "Processed 10 file(s)");
+    EXPECT_TRUE(C().Pic_ProgressFile->Finished());
+    EXPECT_TRUE(IsDateText(C().Lbl_LastDownload->text()));
     EXPECT_EQ(home.Read("data/whole.csv"), "whole file\r\n");
     EXPECT_EQ(home.Read("data/new.csv"), older + newer); // exactly the new records appended
     EXPECT_EQ(service.ReadFile("ann", "up.csv"), "sent always\r\n");

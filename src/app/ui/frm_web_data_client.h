@@ -194,6 +194,8 @@ private:
     void Chk_Trace_Click();
 
     void SetLoadedFile(const QString& path);
+    // StoreCurrentRecord without deriving the states.
+    void StoreFields();
     const FileRecord& RecordAt(int number) const;
     bool FileListFromUser() const;
     int SelectedTypeID() const;

@@ -103,7 +103,9 @@ void frm_WebDataClient::Cmb_TypeID_Click() {
 
 void frm_WebDataClient::Lst_Files_Click() {
     if (flags_.IsLoading) return;
-    if (StoreCurrentRecord()) ShowCurrentRecord();
+    // The states are derived once, when the next record is shown.
+    StoreFields();
+    ShowCurrentRecord();
 }
 
 } // namespace quorvel

@@ -92,12 +92,16 @@ FileRecord frm_WebDataClient::FieldsRecord() const {
 }
 
 bool frm_WebDataClient::StoreCurrentRecord() {
+    StoreFields();
+    EnableControls();
+    return true;
+}
+
+void frm_WebDataClient::StoreFields() {
     // FileID and SpareNumber are the record's own; FieldsRecord keeps them.
     if (currentRecord_ > 0 && currentRecord_ <= files_.Count())
         files_.At(currentRecord_ - 1) = FieldsRecord();
     flags_.RecordEdited = false;
-    EnableControls();
-    return true;
 }
 
 void frm_WebDataClient::ShowLocalDate(int index, const QString& date) {

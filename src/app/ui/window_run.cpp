@@ -4,7 +4,67 @@
 #include "app/ui/frm_web_data_client.h"
 #include "support/ui/progress_bar.h"
 
+#include <QCoreApplication>
+
+#include <utility>
+
 namespace quorvel {
+
+PaintThrottle::PaintThrottle(QWidget* window) : window_(window) {
+    timer_.setInterval(kPaintMs);
+    connect(&timer_, &QTimer::timeout, this, [this] { Release(); });
+}
+
+void PaintThrottle::SetOn(bool on) {
+    if (on == on_) return;
+    on_ = on;
+    if (on) {
+        QCoreApplication::instance()->installEventFilter(this);
+        sinceTurn_.start();
+        timer_.start();
+    } else {
+        QCoreApplication::instance()->removeEventFilter(this);
+        timer_.stop();
+        Release();
+    }
+}
+
+// Qt asks a window to lay out and to draw what changed with one request each,
+// and asks again only after the request was handled; a held request is sent
+// anew when its turn comes.
+bool PaintThrottle::eventFilter(QObject* watched, QEvent* event) {
+    const QEvent::Type type = event->type();
+    if (releasing_ || (type != QEvent::UpdateRequest && type != QEvent::LayoutRequest))
+        return false;
+    auto* widget = qobject_cast<QWidget*>(watched);
+    if (widget == nullptr || (widget != window_ && !window_->isAncestorOf(widget))) return false;
+    if (sinceTurn_.elapsed() >= kPaintMs) {
+        Release();
+        return false;
+    }
+    if (type == QEvent::UpdateRequest)
+        drawHeld_ = true;
+    else if (!layoutHeld_.contains(widget))
+        layoutHeld_.append(widget);
+    return true;
+}
+
+void PaintThrottle::Release() {
+    sinceTurn_.start();
+    releasing_ = true;
+    const QList<QPointer<QWidget>> layouts = std::exchange(layoutHeld_, {});
+    for (const QPointer<QWidget>& widget : layouts) {
+        QEvent request(QEvent::LayoutRequest);
+        if (widget) QCoreApplication::sendEvent(widget, &request);
+    }
+    if (std::exchange(drawHeld_, false)) {
+        QEvent request(QEvent::UpdateRequest);
+        QCoreApplication::sendEvent(window_, &request);
+    }
+    releasing_ = false;
+}
+
+WindowRun::WindowRun(frm_WebDataClient& window) : window_(window), throttle_(&window) {}
 
 RunSettings WindowRun::Settings() const {
     return window_.FieldSettings();
@@ -49,6 +109,7 @@ void WindowRun::StampLastRun(const QString& when) {
 }
 
 void WindowRun::BusyChanged(bool busy) {
+    throttle_.SetOn(busy);
     window_.EnableControls();
     if (!busy) window_.RefreshFileStatus();
 }

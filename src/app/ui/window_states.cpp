@@ -167,7 +167,12 @@ void frm_WebDataClient::AddTrace(const QString& text) {
 
 void frm_WebDataClient::ShowStatus(const QString& text) {
     AddTrace(QStringLiteral("Status>") + text);
+    // During a run the label is drawn at the window's pace, not at once for
+    // every one of the exchange's texts.
+    const bool hold = engine_->IsBusy();
+    if (hold) c_.Lbl_status->setUpdatesEnabled(false);
     SetStatusLabel(c_.Lbl_status, text);
+    if (hold) c_.Lbl_status->setUpdatesEnabled(true);
     if (isMinimized()) setWindowTitle(text);
 }
 
