@@ -196,6 +196,7 @@ void CurlWholeFiles(benchmark::State& state, bool checked) {
             const std::string url = "ftp://" + server + "/wd/bench/" + name;
             curl_easy_setopt(curl, CURLOPT_URL, url.c_str());
             if (checked) {
+                curl_easy_setopt(curl, CURLOPT_WRITEFUNCTION, Discard);
                 curl_easy_setopt(curl, CURLOPT_NOBODY, 1L);
                 curl_easy_setopt(curl, CURLOPT_FILETIME, 1L);
                 if (curl_easy_perform(curl) != CURLE_OK) state.SkipWithError("curl find failed");

@@ -46,6 +46,11 @@ for i in range(100):
         f.write(block)
 PY
 
+# Written out and read once before anything is timed, so that no run waits for
+# the disk to catch up with the files made here.
+sync
+cat "$user_dir"/*.dat >/dev/null
+
 "$root/server/run" --port 0 --ftp-port 0 --data "$data" >"$tmp/run.out" 2>&1 &
 run_pid=$!
 for _ in $(seq 300); do grep -q 'Ctrl+C stops' "$tmp/run.out" 2>/dev/null && break; sleep 0.1; done

@@ -88,7 +88,8 @@ void frm_WebDataClient::EnableControls() {
         c_.lbl_UserLocationFolder[i]->setToolTip(c_.lbl_UserLocationFolder[i]->text());
     }
     PlotRouteLines();
-    ConfigureClass();
+    // A run hands the fields to the services itself, before every file.
+    if (!in.busy) ConfigureClass();
 }
 
 void frm_WebDataClient::RefreshFileStatus() {
@@ -100,14 +101,15 @@ void frm_WebDataClient::RefreshFileStatus() {
         }
         return;
     }
-    // During a run the service is busy with the run itself; its side is looked
-    // at again when the run ends.
-    const int sides = engine_->IsBusy() ? 1 : 2;
+    // During a run the files are the run's: their dates are read by the
+    // exchange itself and the service is busy with it. Both are looked at
+    // again when the run ends.
+    const bool running = engine_->IsBusy();
     for (int i = 0; i < 2; ++i) {
         const LocationPath full = FullFilename(i);
         c_.Lbl_FullFilename[i]->setText(full.ok() ? full.path : full.refusal);
         c_.Lbl_FullFilename[i]->setToolTip(c_.Lbl_FullFilename[i]->text());
-        if (i >= sides) {
+        if (running) {
             c_.Lbl_LastDate[i]->clear();
             continue;
         }
@@ -118,7 +120,7 @@ void frm_WebDataClient::RefreshFileStatus() {
                 : QString());
     }
     ShowLocalStatus(FullFilename(kOnThisPc));
-    if (sides > 1)
+    if (!running)
         ShowRemoteStatus(FullFilename(kAtService));
     else
         SetFileStatus(c_.Lbl_FileStatus[1], QString(), false);
@@ -167,12 +169,13 @@ void frm_WebDataClient::AddTrace(const QString& text) {
 
 void frm_WebDataClient::ShowStatus(const QString& text) {
     AddTrace(QStringLiteral("Status>") + text);
-    // During a run the label is drawn at the window's pace, not at once for
-    // every one of the exchange's texts.
-    const bool hold = engine_->IsBusy();
-    if (hold) c_.Lbl_status->setUpdatesEnabled(false);
-    SetStatusLabel(c_.Lbl_status, text);
-    if (hold) c_.Lbl_status->setUpdatesEnabled(true);
+    if (engine_->IsBusy() && !text.isEmpty() && !c_.Lbl_status->text().isEmpty()) {
+        // During a run the exchanges report several texts a file: the label
+        // keeps its colour and is drawn at the window's pace.
+        c_.Lbl_status->setText(text);
+    } else {
+        SetStatusLabel(c_.Lbl_status, text);
+    }
     if (isMinimized()) setWindowTitle(text);
 }
 
