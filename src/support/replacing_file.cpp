@@ -37,7 +37,8 @@ bool ReplacingFile::Open() {
 
 bool ReplacingFile::Write(QByteArrayView bytes) {
     if (!error_.isEmpty()) return false;
-    if (!file_.isOpen()) return Fail(QStringLiteral("write"), QStringLiteral("the file is not open"));
+    if (!file_.isOpen())
+        return Fail(QStringLiteral("write"), QStringLiteral("the file is not open"));
     const char* data = bytes.data();
     qint64 left = bytes.size();
     while (left > 0) {
@@ -54,14 +55,14 @@ bool ReplacingFile::Write(QByteArrayView bytes) {
 
 bool ReplacingFile::Commit() {
     if (!error_.isEmpty()) return false;
-    if (!file_.isOpen()) return Fail(QStringLiteral("write"), QStringLiteral("the file is not open"));
+    if (!file_.isOpen())
+        return Fail(QStringLiteral("write"), QStringLiteral("the file is not open"));
     QString reason;
     if (!SyncToDisk(static_cast<int>(file_.handle()), &reason))
         return Fail(QStringLiteral("write"), reason);
     if (const qint64 onDisk = file_.size(); onDisk != written_) {
-        return Fail(QStringLiteral("write"), QStringLiteral("%1 of %2 bytes reached the disk")
-                                                 .arg(onDisk)
-                                                 .arg(written_));
+        return Fail(QStringLiteral("write"),
+                    QStringLiteral("%1 of %2 bytes reached the disk").arg(onDisk).arg(written_));
     }
     if (!file_.commit()) return Fail(QStringLiteral("replace"), ReasonOf(file_));
     return true;
@@ -80,9 +81,9 @@ bool ReplacingFile::Fail(const QString& action, const QString& reason) {
     return false;
 }
 
-std::optional<QString> ReplaceFileContents(const QString& path, QByteArrayView bytes,
-                                           std::optional<QFileDevice::Permissions>
-                                               newFilePermissions) {
+std::optional<QString>
+ReplaceFileContents(const QString& path, QByteArrayView bytes,
+                    std::optional<QFileDevice::Permissions> newFilePermissions) {
     ReplacingFile file(path);
     if (newFilePermissions) file.SetNewFilePermissions(*newFilePermissions);
     if (file.Open() && file.Write(bytes) && file.Commit()) return std::nullopt;

@@ -67,8 +67,8 @@ private:
 };
 
 // Replaces the file's content by bytes; the error text when it failed.
-std::optional<QString> ReplaceFileContents(const QString& path, QByteArrayView bytes,
-                                           std::optional<QFileDevice::Permissions>
-                                               newFilePermissions = std::nullopt);
+std::optional<QString>
+ReplaceFileContents(const QString& path, QByteArrayView bytes,
+                    std::optional<QFileDevice::Permissions> newFilePermissions = std::nullopt);
 
 } // namespace quorvel

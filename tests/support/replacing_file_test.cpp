@@ -29,7 +29,8 @@ FullDisk::Outcome ReplaceInPieces(const QString& path, const QByteArray& bytes, 
     ReplacingFile file(path);
     bool ok = file.Open();
     for (qsizetype at = 0; ok && at < bytes.size(); at += piece)
-        ok = file.Write(QByteArrayView(bytes).sliced(at, std::min<qsizetype>(piece, bytes.size() - at)));
+        ok = file.Write(
+            QByteArrayView(bytes).sliced(at, std::min<qsizetype>(piece, bytes.size() - at)));
     ok = ok && file.Commit();
     return {ok, file.ErrorText()};
 }
@@ -54,8 +55,8 @@ TEST_P(ReplacingFileOnFullDisk, FailsKeepsTheOldFileAndSaysWhy) {
         return c.piece == 0 ? Replace(path, bytes) : ReplaceInPieces(path, bytes, c.piece);
     });
     EXPECT_FALSE(outcome.ok);
-    EXPECT_EQ(outcome.text, QStringLiteral("Could not write ") + path + QStringLiteral(": ") +
-                                disk.Reason());
+    EXPECT_EQ(outcome.text,
+              QStringLiteral("Could not write ") + path + QStringLiteral(": ") + disk.Reason());
     EXPECT_EQ(disk.Read(QStringLiteral("settings.ini")), kOld);
     EXPECT_EQ(disk.Files(), QStringList{QStringLiteral("settings.ini")});
 }
@@ -71,7 +72,8 @@ INSTANTIATE_TEST_SUITE_P(
 TEST(ReplacingFile, ReplacesKeepsPermissionsAndSetsThoseOfANewFile) {
     TempHome home;
     const QString path = home.Write(QStringLiteral("list.txt"), kOld);
-    const auto ownerOnly = QFile::ReadOwner | QFile::WriteOwner | QFile::ReadUser | QFile::WriteUser;
+    const auto ownerOnly =
+        QFile::ReadOwner | QFile::WriteOwner | QFile::ReadUser | QFile::WriteUser;
     QFile::setPermissions(path, ownerOnly);
     EXPECT_EQ(ReplaceFileContents(path, "new content"), std::nullopt);
     EXPECT_EQ(home.Read(QStringLiteral("list.txt")), QByteArray("new content"));
@@ -80,7 +82,8 @@ TEST(ReplacingFile, ReplacesKeepsPermissionsAndSetsThoseOfANewFile) {
     const QString fresh = home.File(QStringLiteral("fresh.ini"));
     EXPECT_EQ(ReplaceFileContents(fresh, "", QFile::ReadOwner | QFile::WriteOwner), std::nullopt);
     EXPECT_TRUE(QFileInfo(fresh).isFile());
-    EXPECT_EQ(QFile::permissions(fresh) & (QFile::ReadGroup | QFile::ReadOther), QFile::Permissions());
+    EXPECT_EQ(QFile::permissions(fresh) & (QFile::ReadGroup | QFile::ReadOther),
+              QFile::Permissions());
 }
 
 TEST(ReplacingFile, UnfinishedWriteLeavesTheOldFileAndNoTemporaryFile) {
