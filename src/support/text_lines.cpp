@@ -23,7 +23,8 @@ std::vector<ByteLine> SplitByteLines(QByteArrayView bytes) {
 
 bool IsValidUtf8(QByteArrayView bytes) {
     QStringDecoder utf8(QStringConverter::Utf8, QStringConverter::Flag::Stateless);
-    (void)utf8.decode(bytes);
+    // The decoder works only when its result is taken.
+    const QString text = utf8.decode(bytes);
     return !utf8.hasError();
 }
 
