@@ -36,10 +36,19 @@ int PeerProcess::CountInLog(const QString& text, int expected) {
     return static_cast<int>(Log().count(text));
 }
 
-bool FtpPeer::Start(const QString& root, int port) {
-    return PeerProcess::Start(
-        QStringLiteral("ftp_peer.py"),
-        {root, QStringLiteral("logger"), QStringLiteral("secret"), QString::number(port)});
+bool FtpPeer::Start(const QString& root, int port, const QByteArray& faults) {
+    return PeerProcess::Start(QStringLiteral("ftp_peer.py"),
+                              {root, QStringLiteral("logger"), QStringLiteral("secret"),
+                               QString::number(port), QString::fromUtf8(faults)});
+}
+
+QStringList FtpPeer::Commands(int expected) {
+    const QString tag = QStringLiteral("CMD ");
+    CountInLog(tag, expected);
+    QStringList commands;
+    for (const QString& line : Log().split(QLatin1Char('\n')))
+        if (line.startsWith(tag)) commands << line.mid(tag.size());
+    return commands;
 }
 
 } // namespace quorvel::testing
