@@ -124,8 +124,8 @@ void SmallFilesOurs(benchmark::State& state) {
         ::sync();
         state.ResumeTiming();
         for (int i = 1; i <= kSmallFiles; ++i) {
-            if (!bench->session.Download(SmallName(i), bench->Path(QStringLiteral("ours_") +
-                                                                   QString::number(i)))) {
+            if (!bench->session.Download(
+                    SmallName(i), bench->Path(QStringLiteral("ours_") + QString::number(i)))) {
                 state.SkipWithError(qPrintable(bench->session.LastError()));
                 break;
             }

@@ -5,6 +5,7 @@
 #include <QProcess>
 #include <QString>
 #include <QStringList>
+#include <QTemporaryDir>
 
 namespace quorvel::testing {
 
@@ -22,9 +23,11 @@ public:
     int CountInLog(const QString& text, int expected);
 
 private:
+    QString LogFile() const;
+
+    QTemporaryDir logDir_;
     QProcess process_;
     int port_ = 0;
-    QString log_;
 };
 
 // An FTP server with user "logger" and password "secret" over a root folder,
