@@ -58,7 +58,9 @@ wait_for() { # file pattern
 run_pid=$!
 wait_for "$tmp/run.out" 'Ctrl+C stops'
 port=$(sed -n 's|^HTTP: http://127\.0\.0\.1:\([0-9]*\)/.*|\1|p' "$tmp/run.out")
-php_pid=$(sed -n 's|^\[\([0-9]*\)\].*Development Server.*started|\1|p' "$data/logs/http.log" | head -1)
+# The PHP process: the child of the guard that server/run starts for it.
+guard_pid=$(pgrep -P "$run_pid" -f -- '--guard php')
+php_pid=$(pgrep -P "$guard_pid" -x php)
 
 php -S 127.0.0.1:0 -t "$tmp/www" >/dev/null 2>"$tmp/static.log" &
 static_pid=$!

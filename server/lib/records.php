@@ -31,23 +31,54 @@ function is_protocol_line(string $line): bool
         strncasecmp($line, 'php', 3) === 0;
 }
 
-// A pattern that matches a canonical "yyyy-mm-dd HH:MM:SS" later than $after
-// (itself canonical): digit by digit, the same prefix and then a greater digit.
+// A pattern that matches a valid canonical "yyyy-mm-dd HH:MM:SS" later than
+// $after (itself canonical): field by field, the same fields and then a greater
+// one, each later field any valid value. Impossible days (30 February, 31 April,
+// 29 February outside leap years) never match.
 function later_than_pattern(string $after): string
 {
-    $shape = 'dddd-dd-dd dd:dd:dd';
+    // Offset, width and highest value of each field; the year is any four digits.
+    $fields = [[0, 4, 9999], [5, 2, 12], [8, 2, 31], [11, 2, 23], [14, 2, 59], [17, 2, 59]];
+    $any = ['\d{4}', '(?:0[1-9]|1[0-2])', '(?:0[1-9]|[12]\d|3[01])', '(?:[01]\d|2[0-3])', '[0-5]\d', '[0-5]\d'];
+    $separators = ['-', '-', ' ', ':', ':'];
     $branches = [];
-    for ($i = 0; $i < 19; ++$i) {
-        if ($shape[$i] !== 'd' || $after[$i] === '9') {
+    foreach ($fields as $k => [$at, $width, $highest]) {
+        $greater = $k === 0 ? greater_year_pattern(substr($after, 0, 4)) : greater_value_pattern(
+            (int) substr($after, $at, $width), $highest);
+        if ($greater === null) {
             continue;
         }
         $rest = '';
-        for ($j = $i + 1; $j < 19; ++$j) {
-            $rest .= $shape[$j] === 'd' ? '\d' : $shape[$j];
+        for ($j = $k + 1; $j < count($fields); ++$j) {
+            $rest .= $separators[$j - 1] . $any[$j];
         }
-        $branches[] = substr($after, 0, $i) . '[' . ((int) $after[$i] + 1) . '-9]' . $rest;
+        $branches[] = substr($after, 0, $at) . $greater . $rest;
     }
-    return $branches ? '(?:' . implode('|', $branches) . ')' : '(?!)';
+    $leapYear = '(?:\d\d(?:0[48]|[2468][048]|[13579][26])|(?:[02468][048]|[13579][26])00)';
+    $impossibleDay = '(?!\d{4}-(?:02-(?:3|29(?<!' . $leapYear . '-02-29))|0[469]-31|11-31))';
+    return $branches ? $impossibleDay . '(?:' . implode('|', $branches) . ')' : '(?!)';
+}
+
+// Two-digit values above $value up to $highest, or null when there are none.
+function greater_value_pattern(int $value, int $highest): ?string
+{
+    $values = [];
+    for ($v = $value + 1; $v <= $highest; ++$v) {
+        $values[] = sprintf('%02d', $v);
+    }
+    return $values ? '(?:' . implode('|', $values) . ')' : null;
+}
+
+// Four-digit years above $year: the same leading digits, then a greater digit.
+function greater_year_pattern(string $year): ?string
+{
+    $branches = [];
+    for ($i = 0; $i < 4; ++$i) {
+        if ($year[$i] !== '9') {
+            $branches[] = substr($year, 0, $i) . '[' . ((int) $year[$i] + 1) . '-9]' . str_repeat('\d', 3 - $i);
+        }
+    }
+    return $branches ? '(?:' . implode('|', $branches) . ')' : null;
 }
 
 // Selects the records of a file whose date is later than a given one. Most
@@ -72,10 +103,7 @@ final class RecordFilter
         private readonly RecordSink $sink,
     ) {
         if ($afterSeconds !== null && in_array($type, [DATE_TIME, GEMINI, TEKSMART], true) && $afterSeconds > 0) {
-            $leapYear = '(?:\d\d(?:0[48]|[2468][048]|[13579][26])|(?:[02468][048]|[13579][26])00)';
-            $valid = '(?!\d{4}-(?:02-3|0[469]-31|11-31))(?!(?!' . $leapYear . ')\d{4}-02-29)' .
-                '\d{4}-(?:0[1-9]|1[0-2])-(?:0[1-9]|[12]\d|3[01]) (?:[01]\d|2[0-3]):[0-5]\d:[0-5]\d';
-            $later = '^(?=' . $valid . ')' . later_than_pattern(format_iso_seconds($afterSeconds));
+            $later = '^' . later_than_pattern(format_iso_seconds($afterSeconds));
             // The date is field 0: a tab follows it, or a comma with no tab in the line.
             $this->blockPattern = '/' . $later . '(?:\t[^\r\n]*|,[^\t\r\n]*)\r?$/m';
             $this->commaBlockPattern = '/' . $later . ',/m';
