@@ -64,7 +64,10 @@ bool ReferenceService::AddUser(const ServiceUser& user) {
                      QStringLiteral("--quorvel"),
                      ProgramPath(),
                      QStringLiteral("--date-order"),
-                     user.monthFirst ? QStringLiteral("mdy") : QStringLiteral("dmy")};
+                     user.monthFirst ? QStringLiteral("mdy") : QStringLiteral("dmy"),
+                     // The cheapest hash: every request checks the password.
+                     QStringLiteral("--password-cost"),
+                     QStringLiteral("4")};
     if (!user.displayName.isEmpty()) args << QStringLiteral("--display-name") << user.displayName;
     if (!user.dataFolder.isEmpty()) args << QStringLiteral("--data-folder") << user.dataFolder;
     if (!RunTool(QStringLiteral("add-user"), args)) return false;
