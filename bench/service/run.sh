@@ -90,6 +90,7 @@ for n in "${sizes[@]}"; do
   rm -f "$tmp/check.txt"
   echo 5 >"/proc/$php_pid/clear_refs" # the peak memory counts from here
   SERVICE_BENCH_GETDATA_URL="$getdata" \
+  SERVICE_BENCH_GETALL_URL="${getdata%%&date=*}&date=0" \
   SERVICE_BENCH_STATIC_URL="http://127.0.0.1:$static_port/reply$n.txt" \
   SERVICE_BENCH_LOGIN_URL="http://127.0.0.1:$port/wd/wd.php?cmd=GETUSERFOLDERS&user=bench&pwd=bench" \
   SERVICE_BENCH_OUT="$tmp/fetched.txt" \
@@ -98,10 +99,13 @@ for n in "${sizes[@]}"; do
   ours=$(json_field "$tmp/fetch$n.json" BM_ServiceGetData real_time)
   anchor=$(json_field "$tmp/fetch$n.json" BM_StaticFile real_time)
   login=$(json_field "$tmp/fetch$n.json" BM_ServiceLoginCheck real_time)
+  all=$(json_field "$tmp/fetch$n.json" BM_ServiceGetAll real_time)
   peak[$n]=$(peak_mb "$php_pid")
   printf 'service_getdata_%s_records: %.1f ms\n' "$n" "$ours"
   printf 'php_static_file_%s_records: %.1f ms\n' "$n" "$anchor"
   printf 'service_getdata_%s_records_vs_static: %s x\n' "$n" "$(ratio "$ours" "$anchor")"
+  printf 'service_getdata_date0_%s_records: %.1f ms\n' "$n" "$all"
+  printf 'service_getdata_date0_%s_records_vs_static: %s x\n' "$n" "$(ratio "$all" "$anchor")"
   printf 'service_password_check_request_%s_run: %.1f ms\n' "$n" "$login"
   printf 'service_getdata_%s_records_less_password_check_vs_static: %s x\n' "$n" \
     "$(ratio "$("$py" -c "print(float('$ours') - float('$login'))")" "$anchor")"
