@@ -1,7 +1,8 @@
 <?php
 // php block_check.php
 // The service passes whole blocks of "DateTime" records on when one regular
-// expression says every line is later than the client's date. That check must
+// expression (or a narrower one built from the block's first line) says every
+// line is later than the client's date. That check must
 // never pass a line that the line-by-line reading (the client's own rules)
 // would hold back. Compares both on many dates and lines, some made to sit on
 // the edges (equal dates, leap days, impossible days, hour 24, tabs), and
@@ -23,7 +24,22 @@ for ($i = 0; $i < 40; ++$i) {
 foreach ($afterDates as $afterText) {
     $after = S\date_seconds((float) S\parse_date_text($afterText));
     $pattern = '/^' . S\later_than_pattern(S\format_iso_seconds($after)) . ',/m';
-    foreach (lines_near($afterText) as $line) {
+    $lines = lines_near($afterText);
+    // The narrower check, built from a block's first line, must hold back the same lines.
+    $prefixes = [];
+    foreach (array_slice($lines, 0, 60) as $first) {
+        $prefix = S\later_prefix_pattern(substr($first, 0, 19), S\format_iso_seconds($after));
+        if ($prefix !== null) {
+            $prefixes[] = '/^' . $prefix . ',/m';
+        }
+    }
+    foreach ($lines as $line) {
+        foreach ($prefixes as $prefix) {
+            if (preg_match($prefix, $line) === 1 && !((S\line_seconds($line, S\DATE_TIME) ?? PHP_INT_MIN) > $after)) {
+                ++$disagreements;
+                echo "after $afterText the check $prefix passes \"$line\"\n";
+            }
+        }
         ++$checked;
         $fast = preg_match($pattern, $line) === 1;
         $seconds = S\line_seconds($line, S\DATE_TIME);
