@@ -158,6 +158,10 @@ struct FullDiskSave {
     int newRecords;
     qint64 room;
 };
+// Test names show the case name, not the bytes of the case.
+void PrintTo(const FullDiskSave& c, std::ostream* os) {
+    *os << c.name;
+}
 
 class FileListSaveOnFullDisk : public ::testing::TestWithParam<FullDiskSave> {};
 

@@ -41,6 +41,10 @@ struct FullDiskCase {
     qsizetype size;
     int piece; // 0: in one piece
 };
+// Test names show the case name, not the bytes of the case.
+void PrintTo(const FullDiskCase& c, std::ostream* os) {
+    *os << c.name;
+}
 
 class ReplacingFileOnFullDisk : public ::testing::TestWithParam<FullDiskCase> {};
 

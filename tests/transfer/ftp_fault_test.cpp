@@ -56,6 +56,10 @@ struct FaultCase {
     std::string error;     // exact, or a regular expression when it starts with "^"
     QByteArray localAfter; // downloads: the local file afterwards; empty: the old copy
 };
+// Test names show the case name, not the bytes of the case.
+void PrintTo(const FaultCase& c, std::ostream* os) {
+    *os << c.name;
+}
 
 std::string Join(std::initializer_list<const char*> parts) {
     std::string joined;
@@ -281,6 +285,10 @@ struct FullDiskDownload {
     qsizetype size;
     qint64 room;
 };
+// Test names show the case name, not the bytes of the case.
+void PrintTo(const FullDiskDownload& c, std::ostream* os) {
+    *os << c.name;
+}
 
 class FtpFullDiskTest : public FtpFaultFixture,
                         public ::testing::WithParamInterface<FullDiskDownload> {};
