@@ -269,6 +269,21 @@ TEST_F(ZipTest, FullDiskLeavesEveryOlderCopyWhole) {
     EXPECT_EQ(disk.Files(), QStringList{QStringLiteral("site.dat")});
 }
 
+TEST_F(ZipTest, PackingOntoAFullDiskKeepsTheOlderArchive) {
+    testing::FullDisk disk;
+    const QString data = disk.Write(QStringLiteral("site.dat"), LoggerText(2000));
+    const QString older = disk.Write(QStringLiteral("site_dat.zip"), "older archive");
+    disk.Fill(4096);
+    const auto outcome = disk.Run([&] {
+        const int code = ZipFiles({data}, older);
+        return testing::FullDisk::Outcome{IsZipError(code), QString::number(code)};
+    });
+    EXPECT_TRUE(outcome.ok) << outcome.text.toStdString();
+    EXPECT_EQ(disk.Read(QStringLiteral("site_dat.zip")), QByteArray("older archive"));
+    EXPECT_EQ(disk.Files(),
+              (QStringList{QStringLiteral("site.dat"), QStringLiteral("site_dat.zip")}));
+}
+
 TEST_F(ZipTest, FullDiskMidwayKeepsTheFileItMetWhole) {
     // The free space covers the sizes the entries declare but not the disk
     // blocks they take, so the disk fills part-way through the archive.
