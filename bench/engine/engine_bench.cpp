@@ -25,7 +25,6 @@
 #include <curl/curl.h>
 
 #include <cstdio>
-#include <string>
 #include <unistd.h>
 
 namespace quorvel {
@@ -186,15 +185,16 @@ size_t WriteToFile(char* data, size_t size, size_t count, void* file) {
 // the old one.
 void CurlWholeFiles(benchmark::State& state, bool checked) {
     QTemporaryDir dir;
-    const std::string server = Env("ENGINE_BENCH_FTP").toStdString();
+    const QString server = Env("ENGINE_BENCH_FTP");
     CURL* curl = curl_easy_init();
     curl_easy_setopt(curl, CURLOPT_USERNAME, "bench");
     curl_easy_setopt(curl, CURLOPT_PASSWORD, Env("ENGINE_BENCH_FTP_PASSWORD").toUtf8().constData());
     for (auto _ : state) {
         for (int i = 0; i < kWholeFiles; ++i) {
-            const std::string name = "w" + std::to_string(i) + ".dat";
-            const std::string url = "ftp://" + server + "/wd/bench/" + name;
-            curl_easy_setopt(curl, CURLOPT_URL, url.c_str());
+            const QString name = QStringLiteral("w%1.dat").arg(i);
+            const QByteArray url =
+                (QStringLiteral("ftp://") + server + QStringLiteral("/wd/bench/") + name).toUtf8();
+            curl_easy_setopt(curl, CURLOPT_URL, url.constData());
             if (checked) {
                 curl_easy_setopt(curl, CURLOPT_WRITEFUNCTION, Discard);
                 curl_easy_setopt(curl, CURLOPT_NOBODY, 1L);
@@ -203,7 +203,7 @@ void CurlWholeFiles(benchmark::State& state, bool checked) {
                 curl_easy_setopt(curl, CURLOPT_NOBODY, 0L);
                 curl_easy_setopt(curl, CURLOPT_FILETIME, 0L);
             }
-            const QString target = dir.filePath(QString::fromStdString(name));
+            const QString target = dir.filePath(name);
             const QString part = checked ? target + QStringLiteral(".part") : target;
             std::FILE* out = std::fopen(part.toUtf8().constData(), "wb");
             curl_easy_setopt(curl, CURLOPT_WRITEFUNCTION, WriteToFile);
