@@ -68,6 +68,13 @@ QByteArray TcpSocketControl::GetData() {
     return socket_.readAll();
 }
 
+void TcpSocketControl::Refresh() {
+    // Each look reads what has come, the close included; a few looks take in
+    // bytes that came just before a close.
+    for (int look = 0; look < 8 && socket_.state() == QAbstractSocket::ConnectedState; ++look)
+        if (!socket_.waitForReadyRead(0)) break;
+}
+
 void TcpSocketControl::OnConnected() {
     // A request goes out line by line; none of them may wait for the peer's
     // acknowledgement of the one before.
@@ -89,8 +96,11 @@ void TcpSocketControl::OnDisconnected() {
 }
 
 void TcpSocketControl::OnError(QAbstractSocket::SocketError error) {
-    // A peer closing is an ordinary close, not a failure.
-    if (error == QAbstractSocket::RemoteHostClosedError || closing_) return;
+    // A peer closing is an ordinary close, not a failure; a look that found
+    // nothing (Refresh) is no failure either.
+    if (error == QAbstractSocket::RemoteHostClosedError ||
+        error == QAbstractSocket::SocketTimeoutError || closing_)
+        return;
     failed_ = true;
     Q_EMIT ErrorOccurred(index_, static_cast<int>(error), socket_.errorString());
 }

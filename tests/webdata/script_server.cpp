@@ -41,21 +41,32 @@ ScriptServer::ScriptServer() {
     connect(&server_, &QTcpServer::newConnection, this, [this] {
         while (QTcpSocket* socket = server_.nextPendingConnection()) {
             ++connections;
+            sockets_ << socket;
             auto buffer = std::make_shared<QByteArray>();
             connect(socket, &QTcpSocket::readyRead, this, [this, socket, buffer] {
                 *buffer += socket->readAll();
                 for (qsizetype end; (end = buffer->indexOf("\r\n\r\n")) >= 0;) {
                     requests << buffer->left(end + 4);
                     buffer->remove(0, end + 4);
-                    if (replies.empty()) continue;
-                    const Reply reply = replies.front();
-                    replies.pop_front();
+                    Reply reply;
+                    if (!replies.empty()) {
+                        reply = replies.front();
+                        replies.pop_front();
+                    } else if (responder) {
+                        reply = responder(requests.last());
+                    }
                     Run(socket, reply, 0);
                 }
             });
         }
     });
     server_.listen(QHostAddress::LocalHost, 0);
+}
+
+void ScriptServer::CloseAll() {
+    for (const QPointer<QTcpSocket>& socket : std::as_const(sockets_))
+        if (socket) socket->disconnectFromHost();
+    sockets_.clear();
 }
 
 void ScriptServer::Run(QTcpSocket* socket, const Reply& reply, std::size_t step) {

@@ -4,9 +4,11 @@
 
 #include <QByteArray>
 #include <QList>
+#include <QPointer>
 #include <QTcpServer>
 
 #include <deque>
+#include <functional>
 #include <vector>
 
 class QTcpSocket;
@@ -40,8 +42,13 @@ public:
     void Queue(const Reply& reply) { replies.push_back(reply); }
     void Queue(const QByteArray& bytes) { Queue(Reply{Send(bytes)}); }
 
-    // Answers to the coming requests in order; a request finding none gets no answer.
+    // Ends every connection from this side at once, without waiting for the client.
+    void CloseAll();
+
+    // Answers to the coming requests in order; a request finding none goes to
+    // the responder, and without one gets no answer.
     std::deque<Reply> replies;
+    std::function<Reply(const QByteArray& request)> responder;
     QList<QByteArray> requests; // each request's bytes, up to and with its blank line
     int connections = 0;
     int sends = 0; // Send steps carried out
@@ -50,6 +57,7 @@ private:
     void Run(QTcpSocket* socket, const Reply& reply, std::size_t step);
 
     QTcpServer server_;
+    QList<QPointer<QTcpSocket>> sockets_;
 };
 
 } // namespace quorvel::testing
