@@ -62,8 +62,11 @@ QString FormatDateLong(DateValue value) {
 }
 
 QString FormatDateIso(DateValue value) {
-    return value == 0 || !InCalendar(value) ? QStringLiteral("0")
-                                            : FormatDate(value, QLatin1String(kPatternIso));
+    if (value == 0 || !InCalendar(value)) return QStringLiteral("0");
+    // Years before 1000 keep four digits, so the text reads back.
+    const QString text = FormatDate(value, QLatin1String(kPatternIso));
+    const qsizetype dash = text.indexOf(QLatin1Char('-'));
+    return dash < 4 ? QString(4 - dash, QLatin1Char('0')) + text : text;
 }
 
 } // namespace quorvel

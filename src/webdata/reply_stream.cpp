@@ -24,6 +24,7 @@ void ReplyStream::Clear() {
     bodyLeft_ = 0;
     afterFinal_ = false;
     wanted_ = false;
+    broken_ = false;
     text_.clear();
     pos_ = 0;
     raw_.clear();
@@ -69,32 +70,33 @@ void ReplyStream::DropText(LineSink& sink) {
     pos_ = 0;
 }
 
-// Moves what the current framing allows from raw_ into text_; false when the
-// chunked coding is broken.
-bool ReplyStream::Fill(LineSink& sink, bool& bodyEnded) {
+// Moves what the current framing allows from raw_ into text_. Broken chunked
+// coding stops the decoding; the lines decoded before it are still read.
+void ReplyStream::Fill(LineSink& sink, bool& bodyEnded) {
     bodyEnded = false;
     switch (mode_) {
     case Mode::kIdle:
         if (!raw_.isEmpty()) sink.OnDropped(std::exchange(raw_, QByteArray()));
-        return true;
+        return;
     case Mode::kHead:
         TakeRaw(raw_.size());
-        return true;
+        return;
     case Mode::kBody:
         break;
     }
     switch (framing_.kind) {
     case Framing::kUntilClose:
         TakeRaw(raw_.size());
-        return true;
+        return;
     case Framing::kLength: {
         const qsizetype n = static_cast<qsizetype>(std::min<std::int64_t>(bodyLeft_, raw_.size()));
         TakeRaw(n);
         bodyLeft_ -= n;
         bodyEnded = bodyLeft_ == 0;
-        return true;
+        return;
     }
     case Framing::kChunked: {
+        if (broken_) return;
         if (pos_ > 0) {
             text_.remove(0, pos_);
             pos_ = 0;
@@ -102,13 +104,12 @@ bool ReplyStream::Fill(LineSink& sink, bool& bodyEnded) {
         qsizetype used = 0;
         const ChunkDecoder::Result r = decoder_.Decode(raw_, text_, used);
         raw_.remove(0, used);
-        if (r == ChunkDecoder::Result::Invalid) return false;
+        broken_ = r == ChunkDecoder::Result::Invalid;
         bodyEnded = r == ChunkDecoder::Result::Done;
         if (bodyEnded) raw_.prepend(decoder_.TakeGivenBack());
-        return true;
+        return;
     }
     }
-    return true;
 }
 
 void ReplyStream::StartBody(const Framing& framing) {
@@ -126,6 +127,7 @@ void ReplyStream::EndBody(LineSink& sink) {
     DropText(sink);
     mode_ = wanted_ ? Mode::kHead : Mode::kIdle;
     afterFinal_ = false;
+    broken_ = false;
     decoder_.Reset();
 }
 
@@ -153,7 +155,7 @@ ReplyStream::Outcome ReplyStream::Drain(LineSink& sink) {
     };
     for (;;) {
         bool bodyEnded = false;
-        if (!Fill(sink, bodyEnded)) return Outcome::BadChunking;
+        Fill(sink, bodyEnded);
         if (mode_ == Mode::kBody && afterFinal_) DropText(sink);
         bool again = false;
         while (!again && pos_ < text_.size()) {
@@ -168,6 +170,13 @@ ReplyStream::Outcome ReplyStream::Drain(LineSink& sink) {
             again = follow(sink.OnLine(line));
         }
         if (again) continue;
+        if (broken_) {
+            // Broken after the final line: the reply is over all the same.
+            if (!afterFinal_) return Outcome::BadChunking;
+            if (!raw_.isEmpty()) sink.OnDropped(std::exchange(raw_, QByteArray()));
+            EndBody(sink);
+            continue;
+        }
         if (bodyEnded) {
             // The end of the body ends its last line.
             if (pos_ < text_.size()) {

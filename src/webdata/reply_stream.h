@@ -69,7 +69,7 @@ public:
 private:
     enum class Mode { kIdle, kHead, kBody };
 
-    bool Fill(LineSink& sink, bool& bodyEnded);
+    void Fill(LineSink& sink, bool& bodyEnded);
     void TakeRaw(qsizetype n);
     void StartBody(const Framing& framing);
     void EndBody(LineSink& sink);
@@ -80,6 +80,7 @@ private:
     std::int64_t bodyLeft_ = 0; // of a body with a length
     bool afterFinal_ = false;   // the body's final line has been read
     bool wanted_ = false;       // a request waits for the next reply
+    bool broken_ = false;       // the chunked coding broke; nothing more is decoded
     QByteArray text_;           // bytes to cut into lines
     qsizetype pos_ = 0;
     QByteArray raw_; // bytes not yet taken into text_
