@@ -1,0 +1,96 @@
+// GETDATA over files that are large or oddly made: the client receives exactly
+// the records after its last date, whatever the file's line ends.
+#include "service_fixture.h"
+
+namespace quorvel::testing {
+namespace {
+
+QByteArray Record(int minute) {
+    const QDateTime t = QDateTime(QDate(2006, 5, 1), QTime(0, 0)).addSecs(minute * 60LL);
+    return t.toString(QStringLiteral("yyyy-MM-dd HH:mm:ss")).toLatin1() + ',' +
+           QByteArray::number(minute);
+}
+
+TEST_F(ServiceTest, LargeFileGivesTheRecordsAfterTheLocalLastDateInFileOrder) {
+    // 30,000 records (about 800 KB, several blocks of the service's reader),
+    // with one late-arriving older record and one unreadable date among them.
+    QByteArrayList records;
+    for (int m = 0; m < 30000; ++m)
+        records << Record(m);
+    records.insert(25000, Record(5));                 // older than the local copy: not new
+    records.insert(26000, "2006-13-40 10:00:00,bad"); // no date: not new
+    QByteArray file = records.join("\r\n") + "\r\n";
+    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("big.dat"), file);
+    QByteArrayList local = records.mid(0, 20000);
+    home.Write(QStringLiteral("big.dat"), local.join("\r\n") + "\r\n");
+
+    ASSERT_TRUE(web.GetNewData(Local(QStringLiteral("big.dat")), 2, 1))
+        << web.LastError().toStdString();
+    QByteArrayList expected = records;
+    expected.removeAt(26000);
+    expected.removeAt(25000);
+    EXPECT_EQ(ReadLocal(QStringLiteral("big.dat")), expected.join("\r\n") + "\r\n");
+}
+
+TEST_F(ServiceTest, RecordsReachTheClientWhateverTheFileLooksLike) {
+    const QByteArray a = "2006-05-01 10:00:00,1", b = "2006-05-01 10:10:00,2",
+                     c = "2006-05-01 10:20:00,3";
+    const QByteArray longLine = "2006-05-01 10:05:00," + QByteArray(1100000, 'x');
+    struct Row {
+        const char* what;
+        QByteArray file;
+        QByteArray received; // after a local copy holding record a
+    };
+    const Row rows[] = {
+        {"CR line ends", a + "\r" + b + "\r" + c + "\r", b + "\r\n" + c + "\r\n"},
+        {"no final line end", a + "\n" + b + "\n" + c, b + "\r\n" + c + "\r\n"},
+        {"mixed line ends and empty lines", a + "\r\n\r\n" + b + "\n\n\r" + c + "\r\n\r\n",
+         b + "\r\n" + c + "\r\n"},
+        {"lines the client would take as the reply's end",
+         a + "\r\nOK,2006-05-01 10:15:00\r\n" + b + "\r\nNOK\r\nphp,2006-05-01 11:00:00\r\n" + c +
+             "\r\n",
+         b + "\r\n" + c + "\r\n"},
+        {"a line too long for the client", a + "\r\n" + b + "\r\n" + longLine + "\r\n" + c + "\r\n",
+         b + "\r\n" + c + "\r\n"},
+    };
+    int n = 0;
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.what);
+        const QString name = QStringLiteral("odd%1.dat").arg(++n);
+        service.PlaceFile(QStringLiteral("ann"), name, row.file);
+        home.Write(name, a + "\r\n");
+        ASSERT_TRUE(web.GetNewData(Local(name), 2, 1)) << web.LastError().toStdString();
+        EXPECT_EQ(ReadLocal(name), a + "\r\n" + row.received);
+        EXPECT_EQ(web.LastDateInFile(name, 2, 1, 1, 1), QStringLiteral("1 May 2006 10:20:00"));
+    }
+}
+
+TEST_F(ServiceTest, RequestsTheClientCannotMakeAreAnsweredWithAReason) {
+    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("s.dat"), "2006-05-01 10:00:00,1\r\n");
+    struct Row {
+        const char* query;
+        const char* answer;
+    };
+    const Row rows[] = {
+        {"cmd=GETDATA&file=s.dat&dt=9&filelocation=2&date=0", "NOK unknown data type \"9\"\r\n"},
+        {"cmd=GETDATA&file=s.dat&filelocation=2&date=0", "NOK unknown data type \"\"\r\n"},
+        {"cmd=GETDATA&file=s.dat&dt=1&filelocation=2&date=soon",
+         "NOK unreadable date \"soon\"\r\n"},
+        {"cmd=GETDATA&file=s.dat&dt=1&filelocation=2&date=2006-05-01%2009%3A59%3A59",
+         "2006-05-01 10:00:00,1\r\nOK\r\n"},
+        {"cmd=GETDATA&file=s.dat&dt=1&filelocation=2&date=2006-05-01%2010%3A00%3A00", "OK\r\n"},
+        {"cmd=SENDDATA&file=s.dat&dt=1&filelocation=2", "NOK unknown command SENDDATA\r\n"},
+        {"cmd=GETFOLDER", "NOK unknown command GETFOLDER\r\n"},
+        {"file=s.dat", "NOK no command\r\n"},
+        {"cmd=GETUSERFOLDERS&trace=on",
+         "php wd.php: GETUSERFOLDERS for ann\r\n/ann|current|/ann/current|/home/ann/loggers|Ann "
+         "Example\r\nOK\r\n"},
+    };
+    for (const Row& row : rows) {
+        SCOPED_TRACE(row.query);
+        EXPECT_EQ(Ask(AsAnn(QLatin1String(row.query))), QLatin1String(row.answer));
+    }
+}
+
+} // namespace
+} // namespace quorvel::testing
