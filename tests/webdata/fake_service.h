@@ -16,7 +16,7 @@ QList<QByteArray> MinuteRecords(int n, int first = 0);
 QByteArray Joined(const QList<QByteArray>& records);
 
 struct FakeService {
-    QList<QByteArray> records;
+    QList<QByteArray> records; // in date order
     bool chunked = false;
     int pieces = 1;  // the GETDATA reply is sent in this many pieces ...
     int pauseMs = 0; // ... with this pause between them

@@ -9,6 +9,7 @@
 
 #include <deque>
 #include <functional>
+#include <memory>
 #include <vector>
 
 class QTcpSocket;
@@ -16,15 +17,19 @@ class QTcpSocket;
 namespace quorvel::testing {
 
 struct Step {
-    enum Kind { kSend, kPause, kClose } kind;
+    enum Kind { kSend, kPause, kClose, kAct } kind;
     QByteArray bytes;
     int ms = 0;
+    std::function<void()> act; // kAct: runs on the server's side, then the next step follows
 };
 using Reply = std::vector<Step>;
 
-inline const auto Send = [](const QByteArray& bytes) { return Step{Step::kSend, bytes}; };
-inline const auto Pause = [](int ms) { return Step{Step::kPause, {}, ms}; };
-inline const auto CloseConnection = [] { return Step{Step::kClose, {}}; };
+inline const auto Send = [](const QByteArray& bytes) { return Step{Step::kSend, bytes, 0, {}}; };
+inline const auto Pause = [](int ms) { return Step{Step::kPause, {}, ms, {}}; };
+inline const auto CloseConnection = [] { return Step{Step::kClose, {}, 0, {}}; };
+inline const auto Act = [](std::function<void()> act) {
+    return Step{Step::kAct, {}, 0, std::move(act)};
+};
 
 // "HTTP/1.1 200 OK", a Content-Length and the given extra header lines, then body.
 QByteArray HttpReply(const QByteArray& body, const QByteArray& extraHeaders = {});
@@ -38,6 +43,7 @@ Reply SplitAt(const QByteArray& bytes, const QList<qsizetype>& offsets);
 class ScriptServer : public QObject {
 public:
     ScriptServer();
+    ~ScriptServer() override;
     QString HostPort() const { return QStringLiteral("127.0.0.1:%1").arg(server_.serverPort()); }
     void Queue(const Reply& reply) { replies.push_back(reply); }
     void Queue(const QByteArray& bytes) { Queue(Reply{Send(bytes)}); }
@@ -54,7 +60,10 @@ public:
     int sends = 0; // Send steps carried out
 
 private:
-    void Run(QTcpSocket* socket, const Reply& reply, std::size_t step);
+    struct Connection;
+    void TakeRequests(const std::shared_ptr<Connection>& c);
+    void NextReply(const std::shared_ptr<Connection>& c);
+    void Run(const std::shared_ptr<Connection>& c, const Reply& reply, std::size_t step);
 
     QTcpServer server_;
     QList<QPointer<QTcpSocket>> sockets_;
