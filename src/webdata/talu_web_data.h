@@ -134,6 +134,7 @@ private:
     // Connection.
     bool OpenConnection();
     bool WaitForReply();
+    bool ReplyCameMeanwhile();
     void PumpOnce();
     QDateTime Now() const;
     QDateTime NextDeadline() const;

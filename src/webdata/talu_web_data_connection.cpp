@@ -79,7 +79,7 @@ bool CTALUWebData::WaitForReply() {
         // A closed connection brings no more of the reply.
         if (replyStatus_ != 0 || closedWhileWaiting_) break;
         PumpOnce();
-        if (Now() > deadline_ || userCancel_) break;
+        if (userCancel_ || (Now() > deadline_ && !ReplyCameMeanwhile())) break;
     }
     waiting_ = false;
     replyKind_ = kNothing;
@@ -90,6 +90,15 @@ bool CTALUWebData::WaitForReply() {
         DropConnection();
     }
     return replyStatus_ == 1;
+}
+
+// The clock says the gap is over, but the thread may have been held up (a
+// loaded or suspended machine, a slow handler elsewhere) while the reply came:
+// the socket announces such bytes only on a later turn of the event loop. One
+// direct look at the socket before giving up; bytes found renew the deadline.
+bool CTALUWebData::ReplyCameMeanwhile() {
+    if (socket_) socket_->Refresh();
+    return replyStatus_ != 0 || closedWhileWaiting_ || Now() <= deadline_;
 }
 
 void CTALUWebData::DropConnection() {

@@ -218,6 +218,49 @@ TEST_F(Faults, BytesThatArriveWhileABoxIsOpenInsideReplyProcessingAreProcessed) 
     EXPECT_EQ(home.Read(QStringLiteral("box.dat")), Joined(records));
 }
 
+// The clock as the client sees it after its thread was held up (a loaded or
+// suspended machine, a slow handler elsewhere in the window): far ahead of the
+// moment the server answered.
+class HeldUpClock : public Clock {
+public:
+    QDateTime Now() const override { return QDateTime::currentDateTime().addMSecs(ahead_); }
+    void HoldUp(std::chrono::milliseconds by) { ahead_ += by.count(); }
+
+private:
+    qint64 ahead_ = 0;
+};
+
+TEST_F(Faults, AReplyThatCameWhileTheClientWasHeldUpPastTheGapIsTaken) {
+    HeldUpClock held;
+    held.SetWaits(clock.Waits());
+    ScopedPorts heldPorts({&prompter, &held, &busy});
+    const Step holdUp = Act([&] { held.HoldUp(kGap * 4); });
+    const QList<QByteArray> records = MinuteRecords(300);
+    const QByteArray lastDate = HttpReply("OK 2006-05-01 14:59:00\r\n");
+    const QByteArray data = HttpReply(Joined(records) + "OK\r\n");
+    const qsizetype half = data.indexOf(records[150]) + 7;
+    const struct {
+        const char* when;
+        Reply lastDate, data;
+    } cases[] = {
+        {"before the last date", {holdUp, Send(lastDate)}, {Send(data)}},
+        {"before the records", {Send(lastDate)}, {holdUp, Send(data)}},
+        {"in the middle of a record",
+         {Send(lastDate)},
+         {Send(data.left(half)), Pause(5), holdUp, Send(data.mid(half))}},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.when);
+        const QString file = home.File(QStringLiteral("held.dat"));
+        QFile::remove(file);
+        server.replies.clear();
+        server.Queue(c.lastDate);
+        server.Queue(c.data);
+        EXPECT_TRUE(web.GetNewData(file, 1, kDateTime)) << web.LastError().toStdString();
+        EXPECT_EQ(home.Read(QStringLiteral("held.dat")), Joined(records));
+    }
+}
+
 TEST_F(Faults, BytesAfterAReplysEndBelongToNoCommand) {
     const std::vector<std::pair<const char*, QByteArray>> leftovers = {
         {"a trailing space counted in the length", HttpReply("a|b|c|d|e\r\nOK\r\n ")},
