@@ -11,8 +11,11 @@
 namespace quorvel {
 
 namespace {
+// Short writes are gathered up to this size ...
 constexpr qsizetype kGather = 256 * 1024;
-}
+// ... and a run of records this long goes out as it is, without a copy.
+constexpr qsizetype kRunAsItIs = 32 * 1024;
+} // namespace
 
 OutputFile::OutputFile() = default;
 
@@ -62,12 +65,12 @@ void OutputFile::WriteLine(QByteArrayView line) {
 }
 
 void OutputFile::WriteLines(QByteArrayView lines) {
-    if (lines.size() < kGather) {
+    if (lines.size() < kRunAsItIs) {
         pending_.append(lines.data(), static_cast<std::size_t>(lines.size()));
         if (pending_.size() >= static_cast<std::size_t>(kGather)) Flush();
         return;
     }
-    // A long run goes out as it is, after what was gathered before it.
+    // After what was gathered before it.
     Flush();
     if (device_->write(lines.data(), lines.size()) != lines.size()) Fail(device_->errorString());
     whole_ += lines.size();

@@ -11,9 +11,10 @@ QByteArrayView WithoutCr(QByteArrayView line) {
 }
 } // namespace
 
-void ReplyStream::Append(const QByteArray& bytes) {
+void ReplyStream::Append(QByteArray bytes) {
     if (raw_.isEmpty())
-        raw_ = bytes; // shared, not copied
+        raw_ =
+            std::move(bytes); // not copied, and ours alone, so taking from its front moves no byte
     else
         raw_.append(bytes);
 }
@@ -53,15 +54,35 @@ void ReplyStream::ExpectReply(LineSink& sink) {
     mode_ = Mode::kHead;
 }
 
-void ReplyStream::TakeRaw(qsizetype n) {
-    if (n <= 0) return;
-    if (pos_ >= text_.size() && n == raw_.size()) {
-        text_ = std::exchange(raw_, QByteArray());
+// Moves up to n bytes from the front of raw_ into text_; returns how many.
+// With no text left over the bytes become the text without a copy. A line left
+// over takes only the bytes that end it; the rest follows on the next round,
+// again without a copy, so a large arrival is never copied to join a few bytes.
+qsizetype ReplyStream::TakeRaw(qsizetype n) {
+    if (n <= 0) return 0;
+    qsizetype take = n;
+    if (pos_ >= text_.size()) {
+        text_.clear();
         pos_ = 0;
-        return;
+        if (n == raw_.size()) {
+            text_ = std::exchange(raw_, QByteArray());
+            return n;
+        }
+    } else {
+        const qsizetype lf = QByteArrayView(raw_).first(n).indexOf('\n');
+        if (lf >= 0) take = lf + 1;
     }
-    text_.append(QByteArrayView(raw_).first(n));
-    raw_.remove(0, n);
+    text_.append(QByteArrayView(raw_).first(take));
+    raw_.remove(0, take);
+    return take;
+}
+
+bool ReplyStream::MoreToTake() const {
+    if (raw_.isEmpty()) return false;
+    if (mode_ == Mode::kHead) return true;
+    if (mode_ != Mode::kBody) return false;
+    return framing_.kind == Framing::kUntilClose ||
+           (framing_.kind == Framing::kLength && bodyLeft_ > 0);
 }
 
 void ReplyStream::DropText(LineSink& sink) {
@@ -89,9 +110,8 @@ void ReplyStream::Fill(LineSink& sink, bool& bodyEnded) {
         TakeRaw(raw_.size());
         return;
     case Framing::kLength: {
-        const qsizetype n = static_cast<qsizetype>(std::min<std::int64_t>(bodyLeft_, raw_.size()));
-        TakeRaw(n);
-        bodyLeft_ -= n;
+        bodyLeft_ -=
+            TakeRaw(static_cast<qsizetype>(std::min<std::int64_t>(bodyLeft_, raw_.size())));
         bodyEnded = bodyLeft_ == 0;
         return;
     }
@@ -191,7 +211,9 @@ ReplyStream::Outcome ReplyStream::Drain(LineSink& sink) {
             text_.remove(0, pos_);
             pos_ = 0;
         }
-        return text_.size() > kLineLimit ? Outcome::LineTooLong : Outcome::Ok;
+        if (text_.size() > kLineLimit) return Outcome::LineTooLong;
+        if (MoreToTake()) continue;
+        return Outcome::Ok;
     }
 }
 

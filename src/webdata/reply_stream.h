@@ -53,7 +53,7 @@ public:
     // Longest text kept without a line end.
     static constexpr qsizetype kLineLimit = qsizetype{1} << 20;
 
-    void Append(const QByteArray& bytes);
+    void Append(QByteArray bytes);
     // Hands every complete line to the sink, in order.
     Outcome Drain(LineSink& sink);
     // A request has gone out: its reply starts where the current reply's
@@ -70,7 +70,9 @@ private:
     enum class Mode { kIdle, kHead, kBody };
 
     void Fill(LineSink& sink, bool& bodyEnded);
-    void TakeRaw(qsizetype n);
+    qsizetype TakeRaw(qsizetype n);
+    // Whether raw_ holds bytes the current framing lets into text_.
+    bool MoreToTake() const;
     void StartBody(const Framing& framing);
     void EndBody(LineSink& sink);
     void DropText(LineSink& sink);

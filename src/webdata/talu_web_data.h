@@ -140,7 +140,7 @@ private:
     QDateTime NextDeadline() const;
     void DropConnection();
     // Replies.
-    void TakeArrival(const QByteArray& data);
+    void TakeArrival(QByteArray data);
     ReplyStream::Next OnLine(QByteArrayView line) override;
     ReplyStream::Framing BodyFraming() const override;
     bool TakesLinesInBulk() const override;

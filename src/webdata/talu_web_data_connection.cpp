@@ -163,9 +163,9 @@ void CTALUWebData::DataArrival(int /*index*/, std::int64_t bytes) {
     try {
         if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
         while (socket_) {
-            const QByteArray data = socket_->GetData();
+            QByteArray data = socket_->GetData();
             if (data.isEmpty()) break;
-            TakeArrival(data);
+            TakeArrival(std::move(data));
         }
     } catch (const WebDataError& e) {
         inArrival_ = false;
@@ -181,10 +181,10 @@ void CTALUWebData::DataArrival(int /*index*/, std::int64_t bytes) {
     dropAfterDrain_ = false;
 }
 
-void CTALUWebData::TakeArrival(const QByteArray& data) {
+void CTALUWebData::TakeArrival(QByteArray data) {
     deadline_ = NextDeadline();
     if (waiting_) replyBytes_ += data.size();
-    stream_.Append(data);
+    stream_.Append(std::move(data));
     if (ShowsReceivedText()) {
         QByteArray shown = stream_.Unconsumed();
         shown.replace("\r\n", "\n");
