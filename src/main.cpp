@@ -40,7 +40,12 @@ int AnswerSwitches(const QStringList& args) {
             QTextStream(stderr) << "--encipher needs the text to encipher\n";
             return 2;
         }
-        out << quorvel::EncryptHex(args.at(at + 1), kLoginKey) << "\n";
+        const QString text = args.at(at + 1);
+        if (const QString why = quorvel::Uncipherable(text); !why.isEmpty()) {
+            QTextStream(stderr) << "--encipher: " << why << "\n";
+            return 2;
+        }
+        out << quorvel::EncryptHex(text, kLoginKey) << "\n";
         return 0;
     }
     return -1;

@@ -1,7 +1,9 @@
 // Time to fetch a reply of the reference service into a file with libcurl, as
 // curl -o would, against PHP's web server serving the same bytes as a static
 // file. run.sh starts both servers. Environment: SERVICE_BENCH_GETDATA_URL,
-// SERVICE_BENCH_STATIC_URL, SERVICE_BENCH_OUT (a file to write to).
+// SERVICE_BENCH_GETALL_URL (the same records asked for with date=0),
+// SERVICE_BENCH_STATIC_URL, SERVICE_BENCH_LOGIN_URL (a GETUSERFOLDERS request:
+// the password check every request pays), SERVICE_BENCH_OUT (a file to write to).
 #include <benchmark/benchmark.h>
 #include <curl/curl.h>
 
@@ -55,8 +57,16 @@ void BM_ServiceGetData(benchmark::State& state) {
     FetchInto(state, Env("SERVICE_BENCH_GETDATA_URL"));
 }
 
+void BM_ServiceGetAll(benchmark::State& state) {
+    FetchInto(state, Env("SERVICE_BENCH_GETALL_URL"));
+}
+
 void BM_StaticFile(benchmark::State& state) {
     FetchInto(state, Env("SERVICE_BENCH_STATIC_URL"));
+}
+
+void BM_ServiceLoginCheck(benchmark::State& state) {
+    FetchInto(state, Env("SERVICE_BENCH_LOGIN_URL"));
 }
 
 BENCHMARK(BM_ServiceGetData)
@@ -64,7 +74,17 @@ BENCHMARK(BM_ServiceGetData)
     ->UseRealTime()
     ->Iterations(1)
     ->Repetitions(5);
+BENCHMARK(BM_ServiceGetAll)
+    ->Unit(benchmark::kMillisecond)
+    ->UseRealTime()
+    ->Iterations(1)
+    ->Repetitions(5);
 BENCHMARK(BM_StaticFile)
+    ->Unit(benchmark::kMillisecond)
+    ->UseRealTime()
+    ->Iterations(1)
+    ->Repetitions(5);
+BENCHMARK(BM_ServiceLoginCheck)
     ->Unit(benchmark::kMillisecond)
     ->UseRealTime()
     ->Iterations(1)

@@ -3,8 +3,10 @@
 # GETDATA of 1,000,000 and 5,000,000 new records through the reference service
 # (server/run, one PHP process) fetched into a file, against PHP's web server
 # serving the same reply bytes as a static file in the same run (best of five
-# each), and the peak memory of the service's PHP process. Every file lives in
-# a temporary folder removed at exit.
+# each), and the peak memory of the service's PHP process. Every request checks
+# the user's password (bcrypt, cost 10): that fixed part is measured on its own
+# too (a GETUSERFOLDERS request). Every file lives in a temporary folder
+# removed at exit.
 set -euo pipefail
 build=$1
 here=$(cd "$(dirname "${BASH_SOURCE[0]}")" && pwd)
@@ -58,7 +60,9 @@ wait_for() { # file pattern
 run_pid=$!
 wait_for "$tmp/run.out" 'Ctrl+C stops'
 port=$(sed -n 's|^HTTP: http://127\.0\.0\.1:\([0-9]*\)/.*|\1|p' "$tmp/run.out")
-php_pid=$(sed -n 's|^\[\([0-9]*\)\].*Development Server.*started|\1|p' "$data/logs/http.log" | head -1)
+# The PHP process: the child of the guard that server/run starts for it.
+guard_pid=$(pgrep -P "$run_pid" -f -- '--guard php')
+php_pid=$(pgrep -P "$guard_pid" -x php)
 
 php -S 127.0.0.1:0 -t "$tmp/www" >/dev/null 2>"$tmp/static.log" &
 static_pid=$!
@@ -86,16 +90,25 @@ for n in "${sizes[@]}"; do
   rm -f "$tmp/check.txt"
   echo 5 >"/proc/$php_pid/clear_refs" # the peak memory counts from here
   SERVICE_BENCH_GETDATA_URL="$getdata" \
+  SERVICE_BENCH_GETALL_URL="${getdata%%&date=*}&date=0" \
   SERVICE_BENCH_STATIC_URL="http://127.0.0.1:$static_port/reply$n.txt" \
+  SERVICE_BENCH_LOGIN_URL="http://127.0.0.1:$port/wd/wd.php?cmd=GETUSERFOLDERS&user=bench&pwd=bench" \
   SERVICE_BENCH_OUT="$tmp/fetched.txt" \
     "$build/bench/service/service_fetch_bench" --benchmark_format=json \
     --benchmark_out="$tmp/fetch$n.json" --benchmark_out_format=json >/dev/null
   ours=$(json_field "$tmp/fetch$n.json" BM_ServiceGetData real_time)
   anchor=$(json_field "$tmp/fetch$n.json" BM_StaticFile real_time)
+  login=$(json_field "$tmp/fetch$n.json" BM_ServiceLoginCheck real_time)
+  all=$(json_field "$tmp/fetch$n.json" BM_ServiceGetAll real_time)
   peak[$n]=$(peak_mb "$php_pid")
   printf 'service_getdata_%s_records: %.1f ms\n' "$n" "$ours"
   printf 'php_static_file_%s_records: %.1f ms\n' "$n" "$anchor"
   printf 'service_getdata_%s_records_vs_static: %s x\n' "$n" "$(ratio "$ours" "$anchor")"
+  printf 'service_getdata_date0_%s_records: %.1f ms\n' "$n" "$all"
+  printf 'service_getdata_date0_%s_records_vs_static: %s x\n' "$n" "$(ratio "$all" "$anchor")"
+  printf 'service_password_check_request_%s_run: %.1f ms\n' "$n" "$login"
+  printf 'service_getdata_%s_records_less_password_check_vs_static: %s x\n' "$n" \
+    "$(ratio "$("$py" -c "print(float('$ours') - float('$login'))")" "$anchor")"
   printf 'service_php_peak_rss_%s_records: %s MB\n' "$n" "${peak[$n]}"
 done
 printf 'service_php_peak_rss_5000000_vs_1000000_records: %s x\n' "$(ratio "${peak[5000000]}" "${peak[1000000]}")"

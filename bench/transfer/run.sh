@@ -19,6 +19,7 @@ for r in runs:
     if r.get("aggregate_name") == "median":
         times[(r["run_name"].split("/iterations")[0], r["aggregate_name"])] = r["real_time"] / 1000.0
 pairs = [("ftp_download", "ours", "curl"), ("ftp_upload", "ours", "curl"),
+         ("ftp_small_files", "ours", "curl"),
          ("zip", "ours", "cli"), ("unzip", "ours", "cli")]
 for name, ours, anchor in pairs:
     a, b = times[(f"{name}/{ours}", "median")], times[(f"{name}/{anchor}", "median")]

@@ -1,7 +1,7 @@
-// FTP download and upload of a 256 MB file over loopback, and zip and unzip of
-// a 100 MB logger-like text file; each against its command-line anchor (curl,
-// zip, unzip) on the same data. The data lives in a temporary folder that is
-// removed at the end.
+// FTP download and upload of a 256 MB file over loopback, 200 small downloads
+// on one connection, and zip and unzip of a 100 MB logger-like text file; each
+// against its command-line anchor (curl, zip, unzip) on the same data. The
+// data lives in a temporary folder that is removed at the end.
 #include "peer_process.h"
 #include "transfer/ftp_session.h"
 #include "transfer/zip_archive.h"
@@ -110,6 +110,35 @@ void FtpUploadCurl(benchmark::State& state) {
          bench->Url("up_curl.dat")});
 }
 
+constexpr int kSmallFiles = 200;
+
+QString SmallName(int i) {
+    return QStringLiteral("small/f%1.dat").arg(i);
+}
+
+// One log-in, then every file in turn, as a run of many small records does.
+void SmallFilesOurs(benchmark::State& state) {
+    for (auto _ : state) {
+        state.PauseTiming();
+        bench->session.Close();
+        ::sync();
+        state.ResumeTiming();
+        for (int i = 1; i <= kSmallFiles; ++i) {
+            if (!bench->session.Download(
+                    SmallName(i), bench->Path(QStringLiteral("ours_") + QString::number(i)))) {
+                state.SkipWithError(qPrintable(bench->session.LastError()));
+                break;
+            }
+        }
+    }
+}
+// curl fetches all of them in one process over one connection.
+void SmallFilesCurl(benchmark::State& state) {
+    Run(state, QStringLiteral("curl"),
+        {"-s", "-S", "-u", "logger:secret", bench->Url("small/f[1-200].dat"), "-o",
+         bench->Path("curl_#1")});
+}
+
 void ZipOurs(benchmark::State& state) {
     for (auto _ : state) {
         Settle(state);
@@ -155,6 +184,10 @@ int main(int argc, char** argv) {
     Bench data;
     bench = &data;
     QDir().mkpath(data.Path("root"));
+    QDir().mkpath(data.Path("root/small"));
+    for (int i = 1; i <= kSmallFiles; ++i) {
+        if (!WriteFile(data.Path("root/" + SmallName(i)), 1500 + 37 * i, true)) return 1;
+    }
     if (!WriteFile(data.Path("root/big.dat"), 256ll << 20, false) ||
         !WriteFile(data.Path("local.dat"), 256ll << 20, false) ||
         !WriteFile(data.Path("logger.dat"), 100ll << 20, true) ||
@@ -174,6 +207,8 @@ int main(int argc, char** argv) {
     Register("ftp_download/curl", FtpDownloadCurl, 15);
     Register("ftp_upload/ours", FtpUploadOurs, 15);
     Register("ftp_upload/curl", FtpUploadCurl, 15);
+    Register("ftp_small_files/ours", SmallFilesOurs, 7);
+    Register("ftp_small_files/curl", SmallFilesCurl, 7);
     Register("zip/ours", ZipOurs, 5);
     Register("zip/cli", ZipCli, 5);
     Register("unzip/ours", UnzipOurs, 11);

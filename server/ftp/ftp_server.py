@@ -3,6 +3,8 @@ user's own folder under the data root. Run with Debian's /usr/bin/python3
 (python3-pyftpdlib).
 
 usage: ftp_server.py --data DIR [--port N] [--auth-delay SECONDS]
+                     [--address ADDRESS] [--passive-ports FIRST-LAST]
+                     [--masquerade ADDRESS]
 
 Prints the port once it listens. Accounts are read from DIR/users.json at
 every log-in, so users added while the server runs can log in at once.
@@ -134,6 +136,10 @@ def main():
     parser.add_argument("--port", type=int, default=0)
     parser.add_argument("--auth-delay", type=float, default=2.0,
                         help="seconds before a failed log-in is answered")
+    parser.add_argument("--address", default="127.0.0.1",
+                        help="address to listen on (default 127.0.0.1; 0.0.0.0 for all)")
+    parser.add_argument("--passive-ports", help="range for passive data connections, as FIRST-LAST")
+    parser.add_argument("--masquerade", help="public address to announce behind NAT")
     args = parser.parse_args()
 
     logging.basicConfig(level=logging.INFO, stream=sys.stderr,
@@ -146,7 +152,12 @@ def main():
     handler.auth_failed_timeout = args.auth_delay
     handler.banner = "Quorvel reference service ready."
     handler.permit_foreign_addresses = False
-    server = FTPServer(("127.0.0.1", args.port), handler)
+    if args.passive_ports:
+        first, last = (int(p) for p in args.passive_ports.split("-"))
+        handler.passive_ports = range(first, last + 1)
+    if args.masquerade:
+        handler.masquerade_address = args.masquerade
+    server = FTPServer((args.address, args.port), handler)
     signal.signal(signal.SIGTERM, stop)
     print(server.address[1], flush=True)
     try:

@@ -31,23 +31,83 @@ function is_protocol_line(string $line): bool
         strncasecmp($line, 'php', 3) === 0;
 }
 
-// A pattern that matches a canonical "yyyy-mm-dd HH:MM:SS" later than $after
-// (itself canonical): digit by digit, the same prefix and then a greater digit.
+// The fields of a canonical "yyyy-mm-dd HH:MM:SS": where each ends, its
+// highest value, and a pattern for any valid value of it.
+const DATE_FIELDS = [[4, 9999, '\d{4}'], [7, 12, '(?:0[1-9]|1[0-2])'], [10, 31, '(?:0[1-9]|[12]\d|3[01])'],
+    [13, 23, '(?:[01]\d|2[0-3])'], [16, 59, '[0-5]\d'], [19, 59, '[0-5]\d']];
+
+// Fails at 30 February, 31 April and the like, and 29 February outside leap years.
+function impossible_day_guard(): string
+{
+    $leapYear = '(?:\d\d(?:0[48]|[2468][048]|[13579][26])|(?:[02468][048]|[13579][26])00)';
+    return '(?!\d{4}-(?:02-(?:3|29(?<!' . $leapYear . '-02-29))|0[469]-31|11-31))';
+}
+
+// Any valid value for the fields after field $k, with their separators.
+function later_fields_pattern(int $k): string
+{
+    $rest = '';
+    for ($j = $k + 1; $j < count(DATE_FIELDS); ++$j) {
+        $rest .= 'yyyy-mm-dd HH:MM:SS'[DATE_FIELDS[$j - 1][0]] . DATE_FIELDS[$j][2];
+    }
+    return $rest;
+}
+
+// A pattern that matches a valid canonical "yyyy-mm-dd HH:MM:SS" later than
+// $after (itself canonical): field by field, the same fields and then a greater
+// one, each later field any valid value.
 function later_than_pattern(string $after): string
 {
-    $shape = 'dddd-dd-dd dd:dd:dd';
     $branches = [];
-    for ($i = 0; $i < 19; ++$i) {
-        if ($shape[$i] !== 'd' || $after[$i] === '9') {
-            continue;
+    $start = 0;
+    foreach (DATE_FIELDS as $k => [$end, $highest]) {
+        $value = substr($after, $start, $end - $start);
+        $greater = $k === 0 ? greater_year_pattern($value) : greater_value_pattern((int) $value, $highest);
+        if ($greater !== null) {
+            $branches[] = substr($after, 0, $start) . $greater . later_fields_pattern($k);
         }
-        $rest = '';
-        for ($j = $i + 1; $j < 19; ++$j) {
-            $rest .= $shape[$j] === 'd' ? '\d' : $shape[$j];
-        }
-        $branches[] = substr($after, 0, $i) . '[' . ((int) $after[$i] + 1) . '-9]' . $rest;
+        $start = $end + 1;
     }
-    return $branches ? '(?:' . implode('|', $branches) . ')' : '(?!)';
+    return $branches ? impossible_day_guard() . '(?:' . implode('|', $branches) . ')' : '(?!)';
+}
+
+// A narrower pattern, quicker to check: dates that share $first's year, or year
+// and month, when that is where $first is later than $after. Null otherwise, or
+// when $first is not a valid canonical date later than $after.
+function later_prefix_pattern(string $first, string $after): ?string
+{
+    if (preg_match('/^' . later_than_pattern($after) . '$/D', $first) !== 1) {
+        return null;
+    }
+    // Only a later year or month: a block of records rarely shares a day.
+    foreach (array_slice(DATE_FIELDS, 0, 2) as $k => [$end]) {
+        if (strcmp(substr($first, 0, $end), substr($after, 0, $end)) > 0) {
+            return impossible_day_guard() . substr($first, 0, $end) . later_fields_pattern($k);
+        }
+    }
+    return null;
+}
+
+// Two-digit values above $value up to $highest, or null when there are none.
+function greater_value_pattern(int $value, int $highest): ?string
+{
+    $values = [];
+    for ($v = $value + 1; $v <= $highest; ++$v) {
+        $values[] = sprintf('%02d', $v);
+    }
+    return $values ? '(?:' . implode('|', $values) . ')' : null;
+}
+
+// Four-digit years above $year: the same leading digits, then a greater digit.
+function greater_year_pattern(string $year): ?string
+{
+    $branches = [];
+    for ($i = 0; $i < 4; ++$i) {
+        if ($year[$i] !== '9') {
+            $branches[] = substr($year, 0, $i) . '[' . ((int) $year[$i] + 1) . '-9]' . str_repeat('\d', 3 - $i);
+        }
+    }
+    return $branches ? '(?:' . implode('|', $branches) . ')' : null;
 }
 
 // Selects the records of a file whose date is later than a given one. Most
@@ -61,6 +121,7 @@ final class RecordFilter
     // without tabs.
     private ?string $blockPattern = null;
     private ?string $commaBlockPattern = null;
+    private string $afterText = '';
 
     /**
      * @param ?int $afterSeconds null: every record (the client asked with date=0)
@@ -72,10 +133,8 @@ final class RecordFilter
         private readonly RecordSink $sink,
     ) {
         if ($afterSeconds !== null && in_array($type, [DATE_TIME, GEMINI, TEKSMART], true) && $afterSeconds > 0) {
-            $leapYear = '(?:\d\d(?:0[48]|[2468][048]|[13579][26])|(?:[02468][048]|[13579][26])00)';
-            $valid = '(?!\d{4}-(?:02-3|0[469]-31|11-31))(?!(?!' . $leapYear . ')\d{4}-02-29)' .
-                '\d{4}-(?:0[1-9]|1[0-2])-(?:0[1-9]|[12]\d|3[01]) (?:[01]\d|2[0-3]):[0-5]\d:[0-5]\d';
-            $later = '^(?=' . $valid . ')' . later_than_pattern(format_iso_seconds($afterSeconds));
+            $this->afterText = format_iso_seconds($afterSeconds);
+            $later = '^' . later_than_pattern($this->afterText);
             // The date is field 0: a tab follows it, or a comma with no tab in the line.
             $this->blockPattern = '/' . $later . '(?:\t[^\r\n]*|,[^\t\r\n]*)\r?$/m';
             $this->commaBlockPattern = '/' . $later . ',/m';
@@ -111,7 +170,15 @@ final class RecordFilter
         // rules out empty lines and protocol words).
         $lines = substr_count($block, "\n") + (str_ends_with($block, "\n") ? 0 : 1);
         if (!str_contains($block, "\t")) {
-            return preg_match('/\r(?!\n)/', $block) === 0 && preg_match_all($this->commaBlockPattern, $block) === $lines;
+            if (preg_match('/\r(?!\n)/', $block) !== 0) {
+                return false;
+            }
+            // Records far newer than the client's copy: most blocks share the first one's year or month.
+            $prefix = later_prefix_pattern(substr($block, 0, 19), $this->afterText);
+            if ($prefix !== null && preg_match_all('/^' . $prefix . ',/m', $block) === $lines) {
+                return true;
+            }
+            return preg_match_all($this->commaBlockPattern, $block) === $lines;
         }
         return preg_match_all($this->blockPattern, $block) === $lines;
     }

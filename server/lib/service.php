@@ -34,6 +34,11 @@ final class Reply implements RecordSink
 
     public function lines(string $block): void
     {
+        if ($this->pending === '' && strlen($block) >= 65536) {
+            echo $block; // a whole block of records goes on without a copy
+            flush();
+            return;
+        }
         $this->pending .= $block;
         if (strlen($this->pending) >= 65536) {
             $this->send();

@@ -5,6 +5,7 @@
 #include "app/app_error.h"
 #include "app/file_record.h"
 #include "app/locations.h"
+#include "support/text_lines.h"
 
 #include <QString>
 
@@ -32,7 +33,10 @@ public:
     const std::vector<FileRecord>& Records() const { return records_; }
 
     // Empties the records; LoadedFile and ListChanged are left alone.
-    void Clear() { records_.clear(); }
+    void Clear() {
+        records_.clear();
+        readAsLatin1_.clear();
+    }
     // Inserts before index (at the end when index is Count()); false when full.
     bool Insert(int index, FileRecord record);
     void Append(FileRecord record) { Insert(Count(), std::move(record)); }
@@ -48,6 +52,8 @@ public:
 
     // Replaces the records with those of the file at path; a missing file gives
     // an empty list that will be written there. LoadedFile becomes path.
+    // Whatever kept records out (too many, a number too large, a line too
+    // long) comes back as one error that counts them, never one per line.
     ListLoadResult LoadDataFile(const QString& path);
 
     // Writes the records to LoadedFile when ListChanged is set and the
@@ -61,8 +67,11 @@ public:
     std::optional<AppError> SaveFileListAs(const QString& path, const LocationFolders& folders);
 
     // Writes the records to path through a temporary file that replaces the old
-    // one only when complete. keepGoing, when given, is asked after every line
-    // and may stop the save part-way; the old file then stays as it was.
+    // one only when every byte is on the disk; the error names the file and the
+    // system's reason. A record read from a Latin-1 line is written in Latin-1
+    // again (when it still fits), every other one in UTF-8. keepGoing, when
+    // given, is asked after every line and may stop the save part-way; the old
+    // file then stays as it was.
     std::optional<AppError> WriteTo(const QString& path,
                                     const std::function<bool(int written)>& keepGoing = {}) const;
 
@@ -75,7 +84,11 @@ public:
     bool ListChanged = false; // the records differ from LoadedFile
 
 private:
+    // Appends the record of one line of a file, noting its encoding.
+    std::optional<AppError> LoadLine(const ByteLine& line);
+
     std::vector<FileRecord> records_;
+    std::vector<bool> readAsLatin1_; // beside records_, entry by entry
 };
 
 // Inserts the record for a file the user picked or dropped before entry before

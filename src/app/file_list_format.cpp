@@ -2,9 +2,7 @@
 
 #include "support/value_rules.h"
 
-#include <QRegularExpression>
-#include <QStringConverter>
-#include <QStringDecoder>
+#include <algorithm>
 
 namespace quorvel {
 
@@ -127,10 +125,47 @@ QString FormatFileRecordLine(const FileRecord& r) {
     return fields.join(kListFieldSeparator);
 }
 
+namespace {
+
+bool IsBlank(QChar c) {
+    return c == u' ' || c == u'\t' || c == u'\n' || c == u'\v' || c == u'\f' || c == u'\r';
+}
+
+bool IsDigit(QChar c) {
+    return c >= u'0' && c <= u'9';
+}
+
+// Moves past a run of digits; how many there were.
+qsizetype SkipDigits(QStringView text, qsizetype& i) {
+    const qsizetype start = i;
+    while (i < text.size() && IsDigit(text[i]))
+        ++i;
+    return i - start;
+}
+
+} // namespace
+
+// One pass over the text, so that a line of any length costs its length.
 bool IsNumericText(QStringView text) {
-    static const QRegularExpression number(
-        QStringLiteral(R"(^\s*[+-]?(\d+\.?\d*|\.\d+)([eE][+-]?\d+)?\s*$)"));
-    return number.match(text.toString()).hasMatch();
+    qsizetype i = 0;
+    while (i < text.size() && IsBlank(text[i]))
+        ++i;
+    if (i < text.size() && (text[i] == u'+' || text[i] == u'-')) ++i;
+    const qsizetype whole = SkipDigits(text, i);
+    qsizetype fraction = 0;
+    if (i < text.size() && text[i] == u'.') {
+        ++i;
+        fraction = SkipDigits(text, i);
+    }
+    if (whole == 0 && fraction == 0) return false;
+    if (i < text.size() && (text[i] == u'e' || text[i] == u'E')) {
+        ++i;
+        if (i < text.size() && (text[i] == u'+' || text[i] == u'-')) ++i;
+        if (SkipDigits(text, i) == 0) return false;
+    }
+    while (i < text.size() && IsBlank(text[i]))
+        ++i;
+    return i == text.size();
 }
 
 QString FileField(const QStringList& tokens, int n) {
@@ -162,17 +197,26 @@ ParsedRecordLine ParseFileRecordLine(const QString& line) {
     return parsed;
 }
 
-QStringList SplitListText(const QByteArray& bytes) {
+std::vector<ByteLine> SplitListLines(const QByteArray& bytes) {
     QByteArrayView view(bytes);
     if (view.startsWith("\xEF\xBB\xBF")) view = view.sliced(3);
-    QStringDecoder utf8(QStringConverter::Utf8, QStringConverter::Flag::Stateless);
-    QString text = utf8.decode(view);
-    if (utf8.hasError()) text = QString::fromLatin1(view);
-    static const QRegularExpression lineEnd(QStringLiteral("\r\n|\r|\n"));
-    QStringList lines = text.split(lineEnd);
-    // The line end after the last line opens no further line.
-    if (!lines.isEmpty() && lines.last().isEmpty()) lines.removeLast();
+    return SplitByteLines(view);
+}
+
+QStringList SplitListText(const QByteArray& bytes) {
+    QStringList lines;
+    for (const ByteLine& line : SplitListLines(bytes))
+        lines << DecodeLine(line.text);
     return lines;
+}
+
+QByteArray EncodeListLine(const QString& line, bool latin1) {
+    if (latin1) {
+        const bool fits =
+            std::all_of(line.cbegin(), line.cend(), [](QChar c) { return c.unicode() <= 0xFF; });
+        if (fits) return line.toLatin1();
+    }
+    return line.toUtf8();
 }
 
 QByteArray FormatListText(const std::vector<FileRecord>& records) {

@@ -1,5 +1,7 @@
 #include "support/cipher.h"
 
+#include "support/error_box.h"
+
 #include <array>
 
 namespace quorvel {
@@ -50,9 +52,31 @@ QString ReverseText(const QString& text) {
     return out;
 }
 
+QString Uncipherable(const QString& text) {
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        // A character beyond Latin-1 would turn into "?" and encipher as one.
+        const char32_t code = text.at(i).isHighSurrogate() && i + 1 < text.size()
+                                  ? QChar::surrogateToUcs4(text.at(i), text.at(i + 1))
+                                  : text.at(i).unicode();
+        if (code > 0xFF) {
+            return QStringLiteral("The text cannot be enciphered: its character \"") +
+                   QString::fromUcs4(&code, 1) + QStringLiteral("\" (code ") +
+                   QString::number(code) +
+                   QStringLiteral(") is not one of the 256 Latin-1 characters the cipher carries");
+        }
+    }
+    return {};
+}
+
 QString crypt(const QString& text, const QString& keyText) {
     if (text.isEmpty()) return {};
     const QString key = keyText + ReverseText(QLatin1String(kStoredKeyPart));
+    for (const QString& part : {text, key}) {
+        if (const QString why = Uncipherable(part); !why.isEmpty()) {
+            ShowErrorBox(why, QStringLiteral("crypt"));
+            return {};
+        }
+    }
     return QString::fromLatin1(CryptBytes(text.toLatin1(), key.toLatin1()));
 }
 

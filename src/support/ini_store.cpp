@@ -1,30 +1,39 @@
 #include "support/ini_store.h"
 
+#include "support/replacing_file.h"
+#include "support/text_lines.h"
+
 #include <QFile>
-#include <QFileInfo>
-#include <QSaveFile>
-#include <QStringList>
+
+#include <optional>
 
 namespace quorvel {
 
 namespace {
 
+// The file as it is on disk: lines the program does not change are written
+// back byte for byte, with their own line ends.
 struct IniText {
-    QStringList lines;
-    QString eol = QStringLiteral("\n");
+    std::vector<ByteLine> lines;
+    QByteArray eol = "\n"; // for lines the program adds: the file's first line end
 };
 
 IniText ReadLines(const QString& path) {
     IniText text;
     QFile file(path);
     if (!file.open(QIODevice::ReadOnly)) return text;
-    const QString all = QString::fromUtf8(file.readAll());
-    if (all.contains(QLatin1String("\r\n"))) text.eol = QStringLiteral("\r\n");
-    text.lines = all.split(u'\n');
-    for (QString& line : text.lines)
-        if (line.endsWith(u'\r')) line.chop(1);
-    if (!text.lines.isEmpty() && text.lines.back().isEmpty()) text.lines.removeLast();
+    text.lines = SplitByteLines(file.readAll());
+    for (const ByteLine& line : text.lines) {
+        if (!line.end.isEmpty()) {
+            text.eol = line.end;
+            break;
+        }
+    }
     return text;
+}
+
+QString TextOf(const ByteLine& line) {
+    return DecodeLine(line.text);
 }
 
 // The section name when the line opens one.
@@ -50,17 +59,35 @@ QString ValueOf(const QString& line) {
 }
 
 // Index range [first, end) of a section's body, or nullopt when it is missing.
-std::optional<std::pair<qsizetype, qsizetype>> FindSection(const QStringList& lines,
+std::optional<std::pair<qsizetype, qsizetype>> FindSection(const std::vector<ByteLine>& lines,
                                                            const QString& section) {
-    for (qsizetype i = 0; i < lines.size(); ++i) {
-        const auto name = SectionOf(lines[i]);
+    const auto count = static_cast<qsizetype>(lines.size());
+    for (qsizetype i = 0; i < count; ++i) {
+        const auto name = SectionOf(TextOf(lines[i]));
         if (!name || name->compare(section, Qt::CaseInsensitive) != 0) continue;
         qsizetype end = i + 1;
-        while (end < lines.size() && !SectionOf(lines[end]))
+        while (end < count && !SectionOf(TextOf(lines[end])))
             ++end;
         return std::make_pair(i + 1, end);
     }
     return std::nullopt;
+}
+
+bool IsBlank(const ByteLine& line) {
+    return line.text.trimmed().isEmpty();
+}
+
+// Puts a line in at index, ending the line before it when that one had no end.
+void InsertLine(IniText& text, qsizetype index, const QByteArray& bytes) {
+    if (index > 0 && text.lines[index - 1].end.isEmpty()) text.lines[index - 1].end = text.eol;
+    text.lines.insert(text.lines.begin() + index, ByteLine{bytes, text.eol});
+}
+
+QByteArray Joined(const IniText& text) {
+    QByteArray bytes;
+    for (const ByteLine& line : text.lines)
+        bytes += line.text + line.end;
+    return bytes;
 }
 
 } // namespace
@@ -70,8 +97,10 @@ IniStore::IniStore(QString path) : path_(std::move(path)) {}
 QString IniStore::Read(const QString& section, const QString& key, const QString& fallback) const {
     const IniText text = ReadLines(path_);
     if (const auto range = FindSection(text.lines, section)) {
-        for (qsizetype i = range->first; i < range->second; ++i)
-            if (IsKeyLine(text.lines[i], key)) return ValueOf(text.lines[i]).left(kMaxValueLength);
+        for (qsizetype i = range->first; i < range->second; ++i) {
+            const QString line = TextOf(text.lines[i]);
+            if (IsKeyLine(line, key)) return ValueOf(line).left(kMaxValueLength);
+        }
     }
     return fallback.left(kMaxValueLength);
 }
@@ -81,32 +110,33 @@ bool IniStore::Write(const QString& section, const QString& key, const QString& 
     // A line break inside a value would start a new line of the file.
     QString clean = value;
     clean.replace(u'\r', u' ').replace(u'\n', u' ');
-    const QString entry = key + u'=' + clean;
+    const QByteArray entry = (key + u'=' + clean).toUtf8();
 
     if (const auto range = FindSection(text.lines, section)) {
         qsizetype insertAt = range->first;
         bool replaced = false;
         for (qsizetype i = range->first; i < range->second; ++i) {
-            if (IsKeyLine(text.lines[i], key)) {
-                text.lines[i] = entry;
+            if (IsKeyLine(TextOf(text.lines[i]), key)) {
+                text.lines[i].text = entry;
                 replaced = true;
                 break;
             }
-            if (!text.lines[i].trimmed().isEmpty()) insertAt = i + 1;
+            if (!IsBlank(text.lines[i])) insertAt = i + 1;
         }
-        if (!replaced) text.lines.insert(insertAt, entry);
+        if (!replaced) InsertLine(text, insertAt, entry);
     } else {
-        if (!text.lines.isEmpty() && !text.lines.back().trimmed().isEmpty())
-            text.lines << QString();
-        text.lines << u'[' + section + u']' << entry;
+        if (!text.lines.empty() && !IsBlank(text.lines.back()))
+            InsertLine(text, static_cast<qsizetype>(text.lines.size()), {});
+        InsertLine(text, static_cast<qsizetype>(text.lines.size()),
+                   (u'[' + section + u']').toUtf8());
+        InsertLine(text, static_cast<qsizetype>(text.lines.size()), entry);
     }
 
-    const bool isNew = !QFileInfo::exists(path_);
-    QSaveFile file(path_);
-    if (!file.open(QIODevice::WriteOnly)) return false;
-    if (isNew) file.setPermissions(QFileDevice::ReadOwner | QFileDevice::WriteOwner);
-    file.write((text.lines.join(text.eol) + text.eol).toUtf8());
-    return file.commit();
+    // The settings hold a password: a new file is for its owner's eyes only.
+    const auto error =
+        ReplaceFileContents(path_, Joined(text), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
+    lastError_ = error.value_or(QString());
+    return !error;
 }
 
 LocalSettings::LocalSettings(QString path) : store_(std::move(path)) {}

@@ -1,7 +1,10 @@
 #pragma once
 // An INI file with the private-profile behaviour: sections and keys compared
-// without regard to case, unknown lines kept on write, written atomically and
-// created readable by its owner only.
+// without regard to case. A write changes only the line of its key: every
+// other line goes back byte for byte, with its own line end (CR LF, LF or a
+// lone CR). Each line reads as UTF-8 where valid, else as Latin-1. The file is
+// replaced only by a completely written copy and created readable by its owner
+// only.
 
 #include <QString>
 
@@ -15,13 +18,17 @@ public:
 
     // The value, at most 255 characters; the default when the file or key is missing.
     QString Read(const QString& section, const QString& key, const QString& fallback) const;
-    // Creates the file, the section or the key as needed; false when it failed.
+    // Creates the file, the section or the key as needed; false when it failed,
+    // with the reason in LastError() and the file as it was.
     bool Write(const QString& section, const QString& key, const QString& value);
+    // Names the file and gives the system's reason; empty after a good write.
+    const QString& LastError() const { return lastError_; }
 
     static constexpr int kMaxValueLength = 255;
 
 private:
     QString path_;
+    QString lastError_;
 };
 
 // The settings of section "General": an empty value is stored as "Null" and
@@ -34,6 +41,7 @@ public:
     bool SaveLocalSetting(const QString& key, const QString& value);
 
     const QString& Path() const { return store_.Path(); }
+    const QString& LastError() const { return store_.LastError(); }
 
 private:
     IniStore store_;

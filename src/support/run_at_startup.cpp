@@ -2,13 +2,13 @@
 
 #include "support/error_box.h"
 #include "support/program_home.h"
+#include "support/replacing_file.h"
 
 #include <QCoreApplication>
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QProcessEnvironment>
-#include <QSaveFile>
 #include <QStringList>
 
 namespace quorvel {
@@ -83,11 +83,10 @@ bool CreateShortcut(bool allUsers, const QString& arguments) {
     const QString where = kWhere + QStringLiteral("CreateShortcut switch= ") + arguments;
     if (!QDir().mkpath(QFileInfo(path).absolutePath()))
         return ShowErrorBox(QStringLiteral("Cannot create the folder of ") + path, where);
-    QSaveFile file(path);
     const QString text = AutostartEntryText(ProgramHome::ProgramName(),
                                             QCoreApplication::applicationFilePath(), arguments);
-    if (!file.open(QIODevice::WriteOnly) || file.write(text.toUtf8()) < 0 || !file.commit())
-        return ShowErrorBox(file.errorString(), where);
+    if (const auto error = ReplaceFileContents(path, text.toUtf8()))
+        return ShowErrorBox(*error, where);
     return true;
 }
 

@@ -8,6 +8,7 @@ namespace {
 
 int DebugTrampoline(CURL*, curl_infotype type, char* data, size_t size, void* self) {
     auto* events = static_cast<CurlFtpEvents*>(self);
+    if (type != CURLINFO_TEXT) events->NoteActivity();
     switch (type) {
     case CURLINFO_TEXT:
         events->OnText(data, size);
@@ -103,6 +104,7 @@ void CurlFtpEvents::OnText(const char* data, size_t size) {
 }
 
 int CurlFtpEvents::OnProgress(curl_off_t dlnow, curl_off_t ulnow) {
+    if (dlnow > lastDown_ || ulnow > lastUp_) active_ = true;
     if (dlnow > lastDown_) {
         const curl_off_t step = dlnow - lastDown_;
         lastDown_ = dlnow;

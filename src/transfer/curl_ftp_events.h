@@ -10,6 +10,8 @@
 
 #include <QString>
 
+#include <utility>
+
 namespace quorvel {
 
 class CurlFtpEvents {
@@ -30,6 +32,9 @@ public:
     // Makes the running call end at curl's next progress report.
     void RequestAbort() { abort_ = true; }
     void ClearAbort() { abort_ = false; }
+    // True when a command went out or a reply or data came in since the last ask.
+    bool TakeActivity() { return std::exchange(active_, false); }
+    void NoteActivity() { active_ = true; }
 
     // Entry points of the callbacks (public for the C trampolines).
     void OnText(const char* data, size_t size);
@@ -43,6 +48,7 @@ private:
     bool resolving_ = false;
     bool connectionLost_ = false;
     bool abort_ = false;
+    bool active_ = false;
     curl_off_t lastDown_ = 0;
     curl_off_t lastUp_ = 0;
 };

@@ -22,6 +22,9 @@ long WaitSeconds() {
 long WaitMilliseconds() {
     return std::max<long>(1, static_cast<long>(CurrentClock().Waits().replyGap.count()));
 }
+std::chrono::milliseconds StallLimit() {
+    return std::chrono::milliseconds(WaitMilliseconds());
+}
 
 size_t DiscardBody(char*, size_t size, size_t count, void*) {
     return size * count;
@@ -135,8 +138,10 @@ bool FtpSession::DoOpen() {
 
 bool FtpSession::CreateHandle() {
     curl_ = std::make_unique<CurlHandle>();
-    if (!curl_->Valid()) {
+    runner_ = std::make_unique<CurlMultiRun>();
+    if (!curl_->Valid() || !runner_->Valid()) {
         curl_.reset();
+        runner_.reset();
         return false;
     }
     ids_.internet = ++handlesMade_;
@@ -151,6 +156,9 @@ void FtpSession::ConfigureHandle() {
     curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "ftp");
     curl_easy_setopt(curl, CURLOPT_USERNAME, user_.toUtf8().constData());
     curl_easy_setopt(curl, CURLOPT_PASSWORD, password_.toUtf8().constData());
+    // The data connection goes to the server we logged in to, whatever address
+    // a passive-mode reply names: a hostile reply cannot send it elsewhere.
+    curl_easy_setopt(curl, CURLOPT_FTP_SKIP_PASV_IP, 1L);
     // Remote names go to the server as given, without walking folders.
     curl_easy_setopt(curl, CURLOPT_FTP_FILEMETHOD, static_cast<long>(CURLFTPMETHOD_NOCWD));
     curl_easy_setopt(curl, CURLOPT_CONNECTTIMEOUT_MS, WaitMilliseconds());
@@ -181,11 +189,14 @@ void FtpSession::DoClose() {
         report_.Trace(QStringLiteral("close internet"));
         ids_.internet = 0;
     }
+    runner_.reset(); // closes the connection it holds
     curl_.reset();
 }
 
-// Runs the prepared call. On failure the reason is kept and, when curl dropped
-// the connection, the session closes so that the next call starts afresh.
+// Runs the prepared call. A success drops the reason an earlier try of the
+// same operation left. On failure the reason is kept and, when the connection
+// was dropped or went silent, the session closes so that the next call starts
+// afresh.
 bool FtpSession::Perform(const QString& remote, bool ignoreNotFound) {
     CURL* curl = curl_->get();
     curl_easy_setopt(
@@ -194,13 +205,18 @@ bool FtpSession::Perform(const QString& remote, bool ignoreNotFound) {
     errorBuffer_[0] = '\0';
     localError_.clear();
     events_.BeginCall();
-    const CURLcode code = curl_easy_perform(curl);
-    if (code == CURLE_OK) return true;
-    if (!(ignoreNotFound && code == CURLE_REMOTE_FILE_NOT_FOUND))
-        detail_ = localError_.isEmpty() ? CurlErrorText(code, errorBuffer_) : localError_;
+    const CurlRunResult run =
+        runner_->Run(curl, StallLimit(), [this] { return events_.TakeActivity(); });
+    if (run.code == CURLE_OK) {
+        detail_.clear();
+        return true;
+    }
+    if (run.stalled) errorBuffer_[0] = '\0'; // curl knows nothing of our limit
+    if (!(ignoreNotFound && run.code == CURLE_REMOTE_FILE_NOT_FOUND))
+        detail_ = localError_.isEmpty() ? CurlErrorText(run.code, errorBuffer_) : localError_;
     if (closeRequested_ && detail_.isEmpty())
         detail_ = QStringLiteral("The connection was closed during the transfer");
-    if (events_.ConnectionLost()) DoClose();
+    if (events_.ConnectionLost() || run.stalled) DoClose();
     return false;
 }
 

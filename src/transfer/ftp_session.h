@@ -19,6 +19,7 @@
 #include "support/ports.h"
 #include "transfer/curl_ftp_events.h"
 #include "transfer/curl_handle.h"
+#include "transfer/curl_multi_run.h"
 #include "transfer/ftp_report.h"
 
 #include <QDateTime>
@@ -102,6 +103,7 @@ private:
     FtpReport report_{ids_};
     CurlFtpEvents events_{report_};
     std::unique_ptr<CurlHandle> curl_;
+    std::unique_ptr<CurlMultiRun> runner_; // holds the connection between transfers
     char errorBuffer_[CURL_ERROR_SIZE] = {};
     long handlesMade_ = 0;
     long connectionsMade_ = 0;

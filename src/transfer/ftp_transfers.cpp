@@ -1,12 +1,11 @@
 // The transfers of the FTP session: remote find, download, upload.
 #include "transfer/ftp_session.h"
 
+#include "support/replacing_file.h"
 #include "transfer/ftp_status_events.h"
 
 #include <QFile>
 #include <QFileInfo>
-
-#include <QSaveFile>
 
 #include <algorithm>
 
@@ -17,7 +16,7 @@ namespace {
 constexpr int kTries = 3;
 
 struct WriteTarget {
-    QSaveFile* file;
+    ReplacingFile* file;
     QString* error;
 };
 
@@ -32,9 +31,9 @@ void RestoreDiscard(CURL* curl) {
 
 size_t WriteToFile(char* data, size_t size, size_t count, void* target) {
     auto* out = static_cast<WriteTarget*>(target);
-    const auto bytes = static_cast<qint64>(size * count);
-    if (out->file->write(data, bytes) == bytes) return size * count;
-    *out->error = out->file->errorString();
+    if (out->file->Write(QByteArrayView(data, static_cast<qsizetype>(size * count))))
+        return size * count;
+    *out->error = out->file->ErrorText();
     return 0; // curl ends the transfer with a write error
 }
 
@@ -138,11 +137,12 @@ bool FtpSession::Download(const QString& remote, const QString& local) {
 }
 
 // Receives into a temporary file beside the target, which replaces the target
-// only once everything arrived: a broken transfer leaves the old copy alone.
+// only once everything arrived and is on the disk: a broken transfer or a full
+// disk leaves the old copy alone.
 bool FtpSession::GetOnce(const QString& remote, const QString& local) {
-    QSaveFile file(local);
-    if (!file.open(QIODevice::WriteOnly)) {
-        detail_ = file.errorString();
+    ReplacingFile file(local);
+    if (!file.Open()) {
+        detail_ = file.ErrorText();
         return false;
     }
     WriteTarget target{&file, &localError_};
@@ -154,8 +154,8 @@ bool FtpSession::GetOnce(const QString& remote, const QString& local) {
     const bool received = Perform(remote);
     if (curl_) RestoreDiscard(curl_->get());
     if (!received) return false; // the temporary file goes with `file`
-    if (!file.commit()) {
-        detail_ = file.errorString();
+    if (!file.Commit()) {
+        detail_ = file.ErrorText();
         return false;
     }
     TransferDone();

@@ -20,9 +20,11 @@ int ZipFiles(const QStringList& namesOrPatterns, const QString& zipFile,
              const ZipProgress& progress = {});
 
 // Extracts every entry into the folder (created when missing). An entry whose
-// path would leave the folder refuses the whole archive before anything is
-// written. Each file is written under a temporary name and replaces an older
-// copy only when it was read completely and its checksum matched.
+// path would leave the folder, or files that together would not fit into the
+// free space, refuse the whole archive before anything is written. Each file
+// is written under a temporary name and replaces an older copy only when it
+// was read completely, its checksum matched and every byte reached the disk;
+// an entry never writes more than the size its header declares.
 int UnzipFile(const QString& zipFile, const QString& folder, const ZipProgress& progress = {});
 
 } // namespace quorvel

@@ -36,10 +36,12 @@ enum ZipCode : int {
     kZipReadWriteProblem = 400,
     kZipFolderProblem = 510,
     kZipUnsafeEntry = 520,
+    kZipNoRoom = 530,
 };
 
-// "*" becomes "AllFiles", then every "." becomes "_" (folders included), then
-// ".zip" is appended: data.csv gives data_csv.zip.
+// In the file-name part, "*" becomes "AllFiles" and every "." becomes "_";
+// then ".zip" is appended: data.csv gives data_csv.zip, and the folder stays as
+// it is (/home/first.last/site1.dat gives /home/first.last/site1_dat.zip).
 QString ZipFileName(const QString& name);
 bool IsZipError(int code);
 // word + ":" + the code's message; "Error <code> occured" for unknown codes.

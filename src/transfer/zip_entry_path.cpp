@@ -14,8 +14,9 @@ QString SafeEntryPath(const QString& folder, const QString& entryName) {
         if (part == QStringLiteral("..")) return QString();
         if (part != QStringLiteral(".")) parts << part;
     }
-    if (parts.isEmpty()) return QString();
     const QString root = QDir::cleanPath(QDir(folder).absolutePath());
+    // "./" and the like name the folder itself, as some packers write it.
+    if (parts.isEmpty()) return root + QLatin1Char('/');
     QString path = root + QLatin1Char('/') + parts.join(QLatin1Char('/'));
     if (name.endsWith(QLatin1Char('/'))) path += QLatin1Char('/');
     return path;

@@ -1,5 +1,6 @@
 #include "transfer/zip_codes.h"
 
+#include <algorithm>
 #include <map>
 
 namespace quorvel {
@@ -43,16 +44,20 @@ const std::map<int, const char*>& Messages() {
         {490, "Invalid self-extractor binary version"},
         {510, "Problem creating destination directory"},
         {520, "An entry of the ZIP file would be written outside its folder - nothing extracted"},
+        {530, "Not enough free space for the files of the ZIP file - nothing extracted"},
     };
     return messages;
 }
 } // namespace
 
 QString ZipFileName(const QString& name) {
-    QString zipName = name;
-    zipName.replace(QLatin1Char('*'), QStringLiteral("AllFiles"));
-    zipName.replace(QLatin1Char('.'), QLatin1Char('_'));
-    return zipName + QStringLiteral(".zip");
+    // The zip goes beside the data file, so the folder must stay the same.
+    const qsizetype cut =
+        std::max(name.lastIndexOf(QLatin1Char('\\')), name.lastIndexOf(QLatin1Char('/'))) + 1;
+    QString fileName = name.mid(cut);
+    fileName.replace(QLatin1Char('*'), QStringLiteral("AllFiles"));
+    fileName.replace(QLatin1Char('.'), QLatin1Char('_'));
+    return name.left(cut) + fileName + QStringLiteral(".zip");
 }
 
 bool IsZipError(int code) {

@@ -1,6 +1,8 @@
 // The file list against real files: loading, saving, local dates.
 
 #include "app/file_list.h"
+#include "app/file_list_format.h"
+#include "common/full_disk.h"
 #include "common/recorders.h"
 #include "common/temp_home.h"
 #include "sample_list.h"
@@ -13,6 +15,7 @@
 namespace quorvel {
 namespace {
 
+using testing::FullDisk;
 using testing::TempHome;
 
 const QByteArray kOldList = " 1 ~1~keep~keep.csv~0~0~0~0~0~1~0~~~0\r\n";
@@ -147,6 +150,128 @@ TEST(LocalDates, TheLastLineForAnIdentifierWins) {
     EXPECT_FALSE(list.LoadLocalDates(home.Path()).has_value());
     EXPECT_EQ(list.At(0).FileDateLocal, "5 Jan 2024");
     EXPECT_TRUE(list.At(1).FileDateLocal.isEmpty());
+}
+
+struct FullDiskSave {
+    const char* name;
+    int oldRecords;
+    int newRecords;
+    qint64 room;
+};
+// Test names show the case name, not the bytes of the case.
+void PrintTo(const FullDiskSave& c, std::ostream* os) {
+    *os << c.name;
+}
+
+class FileListSaveOnFullDisk : public ::testing::TestWithParam<FullDiskSave> {};
+
+TEST_P(FileListSaveOnFullDisk, FailsSaysWhyAndKeepsTheOldList) {
+    const FullDiskSave& c = GetParam();
+    FullDisk disk;
+    const QString path = disk.File("files.txt");
+    ASSERT_FALSE(testing::WriteSampleList(path, c.oldRecords).has_value());
+    const QByteArray before = disk.Read("files.txt");
+    disk.Fill(c.room);
+
+    FileList list = testing::SampleList(c.newRecords);
+    list.LoadedFile = path;
+    list.ListChanged = true;
+    const LocationFolders folders{disk.Path(), disk.Path(), {}, {}, {}, {}};
+    const auto outcome = disk.Run([&] {
+        const auto error = list.SaveFileList(folders);
+        return FullDisk::Outcome{!error, error ? error->description + "|" + error->where : ""};
+    });
+    EXPECT_FALSE(outcome.ok);
+    EXPECT_EQ(outcome.text,
+              "Could not write " + path + ": " + disk.Reason() + "|SaveFileList:" + path);
+    EXPECT_EQ(disk.Read("files.txt"), before);
+    EXPECT_EQ(disk.Files(), QStringList{"files.txt"});
+    FileList again;
+    ASSERT_TRUE(again.LoadDataFile(path).ok);
+    EXPECT_EQ(again.Count(), c.oldRecords);
+}
+
+INSTANTIATE_TEST_SUITE_P(Cases, FileListSaveOnFullDisk,
+                         ::testing::Values(FullDiskSave{"SmallListNoRoom", 2, 3, 0},
+                                           FullDiskSave{"LargerListPartialRoom", 40, 483, 8192}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(FileListText, EachLineKeepsItsOwnEncodingBothWays) {
+    TempHome home;
+    const QByteArray utf8Line = " 1 ~1~Caf\xc3\xa9~caf\xc3\xa9.csv~0~0~0~0~0~1~0~~~0\r\n";
+    const QByteArray latin1Line = " 2 ~1~M\xfcller~m\xfcller.csv~0~0~0~0~0~1~0~~~0\r\n";
+    const QString path = home.Write("files.txt", utf8Line + latin1Line + utf8Line);
+    FileList list;
+    ASSERT_TRUE(list.LoadDataFile(path).ok);
+    ASSERT_EQ(list.Count(), 3);
+    EXPECT_EQ(list.At(0).FileName, QString::fromUtf8("caf\u00e9.csv"));
+    EXPECT_EQ(list.At(1).FileName, QString::fromUtf8("m\u00fcller.csv"));
+    EXPECT_EQ(list.At(2).Name, QString::fromUtf8("Caf\u00e9"));
+
+    // Written back as read; a line whose new text Latin-1 cannot hold becomes UTF-8.
+    ASSERT_FALSE(list.WriteTo(path).has_value());
+    EXPECT_EQ(home.Read("files.txt"), utf8Line + latin1Line + utf8Line);
+    list.At(1).Name = QString::fromUtf8("M\u00fcller \u20ac");
+    list.Move(1, 1);
+    ASSERT_FALSE(list.WriteTo(path).has_value());
+    EXPECT_EQ(home.Read("files.txt"),
+              utf8Line + utf8Line +
+                  " 2 ~1~M\xc3\xbcller \xe2\x82\xac~m\xc3\xbcller.csv~0~0~0~0~0~1~0~~~0\r\n");
+}
+
+TEST(FileListText, LongLinesAreReadInLinearTimeAndOverlongOnesRefused) {
+    TempHome home;
+    const QByteArray digits(1'000'000, '7');
+    EXPECT_FALSE(IsNumericText(QString::fromLatin1(digits + "x")));
+    EXPECT_TRUE(IsNumericText(QString::fromLatin1(" " + digits + ".5e3 ")));
+    const QByteArray overlong(3 << 20, '~');
+    const QString path =
+        home.Write("files.txt", digits + "x~1~a~b~0~0\r\n" + overlong + "\r\n" + kOldList);
+    FileList list;
+    const ListLoadResult result = list.LoadDataFile(path);
+    EXPECT_TRUE(result.ok);
+    ASSERT_EQ(list.Count(), 1);
+    EXPECT_EQ(list.At(0).Name, "keep");
+    ASSERT_EQ(result.errors.size(), 1u);
+    EXPECT_EQ(result.errors[0].description, "1 line was not read: longer than 1 MiB (line 2)");
+    EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + path);
+}
+
+TEST(FileListLoad, RecordsBeyondTheLimitAreReportedOnceWithTheirNumber) {
+    TempHome home;
+    const QString path = home.File("files.txt");
+    ASSERT_FALSE(testing::SampleList(FileList::kMaxRecords).WriteTo(path).has_value());
+    QFile file(path);
+    ASSERT_TRUE(file.open(QIODevice::Append));
+    for (int i = 0; i < 40000 - FileList::kMaxRecords; ++i)
+        file.write(" 7 ~1~late~late.csv~0~0~0~0~0~1~0~~~0\r\n");
+    file.write("40000~1~Big~big.csv~0~0~0~0~0~1~0~~~0\r\n");
+    file.close();
+
+    FileList list;
+    const ListLoadResult result = list.LoadDataFile(path);
+    EXPECT_TRUE(result.ok);
+    EXPECT_EQ(list.Count(), FileList::kMaxRecords);
+    ASSERT_EQ(result.errors.size(), 1u);
+    EXPECT_EQ(result.errors[0].description,
+              "7234 records were not loaded: a file list holds at most 32767 records");
+    EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + path);
+}
+
+TEST(FileListLoad, SeveralOverflowsMakeOneReportThatNamesTheFirst) {
+    TempHome home;
+    const QString first = "40000~1~Big~big.csv~0~0~0~0~0~1~0~~~0";
+    const QString path = home.Write(
+        "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + first + "\r\n 3 ~1~c~c.csv~0~99999\r\n").toUtf8());
+    FileList list;
+    const ListLoadResult result = list.LoadDataFile(path);
+    EXPECT_EQ(list.Count(), 3);
+    ASSERT_EQ(result.errors.size(), 1u);
+    EXPECT_EQ(result.errors[0],
+              (AppError{"Overflow in 2 records: a number above 32767 or below -32768 (the first: "
+                        "LoadFilesRecord: " +
+                            first + ")",
+                        "LoadDataFile:" + path}));
 }
 
 } // namespace

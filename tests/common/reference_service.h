@@ -10,6 +10,7 @@
 //   ASSERT_TRUE(service.AddUser({.name = "ann", .password = "p&ss word"}))
 //       << service.LastError().toStdString();
 //   service.PlaceFile("ann", "site1.dat", "2006-05-01 10:00:00,1\r\n");
+//   service.PlaceFile("ann", "files.txt", listLines);  // the user's file list
 //   ASSERT_TRUE(service.Start()) << service.LastError().toStdString();
 //
 //   web.SetRemoteHost(service.HttpHostPort());       // "127.0.0.1:PORT"

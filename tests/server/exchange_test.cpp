@@ -121,18 +121,19 @@ TEST_F(ServiceTest, NewRecordsInEveryLayoutWithLfAndCrLfFiles) {
 
 TEST_F(ServiceTest, MissingLocalFileGetsEveryRecordAlsoWithoutDates) {
     const QByteArrayList lines = {"Site 1 export", "a,1", "b,2", "c,3"};
-    for (const int type : {0, 1}) {
-        SCOPED_TRACE(type);
-        const QString name = QStringLiteral("whole%1.dat").arg(type);
-        service.PlaceFile(QStringLiteral("ann"), name, Joined(lines, "\n", false));
-        ASSERT_TRUE(web.GetNewData(Local(name), 1, type)) << web.LastError().toStdString();
-        EXPECT_EQ(ReadLocal(name), Joined(lines, "\r\n"));
-        // A file whose last record has no date has no last date at the service.
-        EXPECT_EQ(Ask(AsAnn(QStringLiteral("cmd=GETLASTDATE&file=%1&dt=%2&filelocation=1")
-                                .arg(name)
-                                .arg(type))),
-                  QStringLiteral("OK 0\r\n"));
-    }
+    for (const int type : {0, 1})
+        for (const QByteArray& end : {QByteArray("\n"), QByteArray("\r\n")}) {
+            SCOPED_TRACE(std::to_string(type) + (end.size() == 1 ? " LF" : " CR LF"));
+            const QString name = QStringLiteral("whole%1-%2.dat").arg(type).arg(end.size());
+            service.PlaceFile(QStringLiteral("ann"), name, Joined(lines, end, false));
+            ASSERT_TRUE(web.GetNewData(Local(name), 1, type)) << web.LastError().toStdString();
+            EXPECT_EQ(ReadLocal(name), Joined(lines, "\r\n"));
+            // A file whose last record has no date has no last date at the service.
+            EXPECT_EQ(Ask(AsAnn(QStringLiteral("cmd=GETLASTDATE&file=%1&dt=%2&filelocation=1")
+                                    .arg(name)
+                                    .arg(type))),
+                      QStringLiteral("OK 0\r\n"));
+        }
 }
 
 TEST_F(ServiceTest, FileIsFoundInTheUserAndSeasonFolders) {

@@ -5,20 +5,22 @@
 namespace quorvel::testing {
 namespace {
 
+// Records one minute apart from 20 February 2008, so a leap day is among them.
 QByteArray Record(int minute) {
-    const QDateTime t = QDateTime(QDate(2006, 5, 1), QTime(0, 0)).addSecs(minute * 60LL);
+    const QDateTime t = QDateTime(QDate(2008, 2, 20), QTime(0, 0)).addSecs(minute * 60LL);
     return t.toString(QStringLiteral("yyyy-MM-dd HH:mm:ss")).toLatin1() + ',' +
            QByteArray::number(minute);
 }
 
 TEST_F(ServiceTest, LargeFileGivesTheRecordsAfterTheLocalLastDateInFileOrder) {
     // 30,000 records (about 800 KB, several blocks of the service's reader),
-    // with one late-arriving older record and one unreadable date among them.
+    // some separated by tabs, with one late-arriving older record and one
+    // unreadable date among them.
     QByteArrayList records;
     for (int m = 0; m < 30000; ++m)
-        records << Record(m);
+        records << (m >= 27000 && m < 27100 ? Record(m).replace(',', '\t') : Record(m));
     records.insert(25000, Record(5));                 // older than the local copy: not new
-    records.insert(26000, "2006-13-40 10:00:00,bad"); // no date: not new
+    records.insert(26000, "2008-02-30 10:00:00,bad"); // no date: not new
     QByteArray file = records.join("\r\n") + "\r\n";
     service.PlaceFile(QStringLiteral("ann"), QStringLiteral("big.dat"), file);
     QByteArrayList local = records.mid(0, 20000);
@@ -63,6 +65,11 @@ TEST_F(ServiceTest, RecordsReachTheClientWhateverTheFileLooksLike) {
         EXPECT_EQ(ReadLocal(name), a + "\r\n" + row.received);
         EXPECT_EQ(web.LastDateInFile(name, 2, 1, 1, 1), QStringLiteral("1 May 2006 10:20:00"));
     }
+    // Without a local copy every record comes, but still no protocol words.
+    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("fresh.dat"), rows[3].file);
+    ASSERT_TRUE(web.GetNewData(Local(QStringLiteral("fresh.dat")), 2, 1))
+        << web.LastError().toStdString();
+    EXPECT_EQ(ReadLocal(QStringLiteral("fresh.dat")), a + "\r\n" + b + "\r\n" + c + "\r\n");
 }
 
 TEST_F(ServiceTest, RequestsTheClientCannotMakeAreAnsweredWithAReason) {

@@ -154,5 +154,16 @@ TEST(ServiceRun, SimulateAppendsRecordsWithRisingDatesInEveryLayout) {
     }
 }
 
+TEST(ServiceRecords, BlockCheckNeverPassesALineTheClientWouldHoldBack) {
+    QProcess php;
+    php.setProcessChannelMode(QProcess::MergedChannels);
+    php.start(QStringLiteral("php"),
+              {QStringLiteral(QUORVEL_SERVER_TEST_DIR "/php/block_check.php")});
+    ASSERT_TRUE(php.waitForFinished(60000));
+    const QString output = QString::fromUtf8(php.readAll());
+    EXPECT_EQ(php.exitCode(), 0) << output.toStdString();
+    EXPECT_TRUE(output.contains(QStringLiteral(" 0 disagreements"))) << output.toStdString();
+}
+
 } // namespace
 } // namespace quorvel::testing

@@ -1,5 +1,6 @@
 #include "support/ini_store.h"
 
+#include "common/full_disk.h"
 #include "common/temp_home.h"
 
 #include <QFile>
@@ -8,6 +9,7 @@
 #include <gtest/gtest.h>
 
 using namespace quorvel;
+using quorvel::testing::FullDisk;
 using quorvel::testing::TempHome;
 
 TEST(IniStore, MissingFileOrKeyGivesTheDefault) {
@@ -97,4 +99,61 @@ TEST(LocalSettings, EditedValueSurvivesANewReader) {
     ASSERT_TRUE(LocalSettings(home.File("q.ini")).SaveLocalSetting("Interval", "6 hours"));
     EXPECT_EQ(LocalSettings(home.File("q.ini")).GetLocalSetting("Interval", "3 hrs"),
               QString("6 hours"));
+}
+
+TEST(IniStore, LinesItDoesNotOwnAreWrittenBackByteForByte) {
+    TempHome home;
+    const QByteArray before = "; Kommentar f\xfcr caf\xe9\r\n[General]\r\nComment=caf\xe9\r\n"
+                              "Bytes=\xff\xfe\x01\n[Other]\rk=\xe9\r\nUserID=old\r\n";
+    const QString path = home.Write("s.ini", before);
+    LocalSettings settings(path);
+    ASSERT_TRUE(settings.SaveLocalSetting("UserID", QString::fromUtf8("J\u00fcrgen")));
+    ASSERT_TRUE(settings.SaveLocalSetting("New", "1"));
+    EXPECT_EQ(home.Read("s.ini"),
+              QByteArray("; Kommentar f\xfcr caf\xe9\r\n[General]\r\nComment=caf\xe9\r\n"
+                         "Bytes=\xff\xfe\x01\nUserID=J\xc3\xbcrgen\r\nNew=1\r\n[Other]\rk=\xe9\r\n"
+                         "UserID=old\r\n"));
+    // A line that is not UTF-8 reads as Latin-1; one that is, as UTF-8.
+    EXPECT_EQ(settings.GetLocalSetting("Comment", ""), QString::fromUtf8("caf\u00e9"));
+    EXPECT_EQ(settings.GetLocalSetting("UserID", ""), QString::fromUtf8("J\u00fcrgen"));
+}
+
+TEST(IniStore, CarriageReturnsEndLines) {
+    struct Case {
+        const char* name;
+        QByteArray file;
+    };
+    const Case cases[] = {
+        {"CR only", "[General]\rUserID=ann\rPassword=secret\r"},
+        {"CR inside a CR LF line", "[General]\r\nUserID=ann\rPassword=secret\r\n"},
+        {"no end after the last line", "[General]\nUserID=ann\r\nPassword=secret"},
+    };
+    for (const Case& c : cases) {
+        TempHome home;
+        LocalSettings settings(home.Write("s.ini", c.file));
+        EXPECT_EQ(settings.GetLocalSetting("UserID", "dflt"), QString("ann")) << c.name;
+        EXPECT_EQ(settings.GetLocalSetting("Password", "dflt"), QString("secret")) << c.name;
+        ASSERT_TRUE(settings.SaveLocalSetting("Interval", "1 day")) << c.name;
+        EXPECT_EQ(settings.GetLocalSetting("Password", "dflt"), QString("secret")) << c.name;
+        EXPECT_EQ(settings.GetLocalSetting("Interval", "dflt"), QString("1 day")) << c.name;
+        EXPECT_TRUE(home.Read("s.ini").startsWith(c.file)) << c.name;
+    }
+}
+
+TEST(IniStore, FullDiskFailsAndKeepsTheSettingsFile) {
+    FullDisk disk;
+    QByteArray before = "[General]\r\nCFG_URL=http://example.org/quorvel.cfg\r\nUserID=ann\r\n";
+    while (before.size() < 299)
+        before += "Key" + QByteArray::number(before.size()) + "=value\r\n";
+    const QString path = disk.Write("quorvel.ini", before);
+    disk.Fill();
+    LocalSettings settings(path);
+    const auto outcome = disk.Run([&] {
+        const bool ok = settings.SaveLocalSetting("Interval", "6 hrs");
+        return FullDisk::Outcome{ok, settings.LastError()};
+    });
+    EXPECT_FALSE(outcome.ok);
+    EXPECT_EQ(outcome.text, "Could not write " + path + ": " + disk.Reason());
+    EXPECT_EQ(disk.Read("quorvel.ini"), before);
+    EXPECT_EQ(disk.Files(), QStringList{"quorvel.ini"});
 }

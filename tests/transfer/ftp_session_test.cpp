@@ -14,10 +14,7 @@
 
 #include <gtest/gtest.h>
 
-#include <csignal>
 #include <functional>
-
-#include <sys/resource.h>
 
 namespace quorvel {
 namespace {
@@ -195,40 +192,6 @@ TEST_F(FtpSessionTest, ServerStoppedDuringDownloadLeavesOldCopyAndReconnectsLate
         << session.LastError().toStdString();
     EXPECT_EQ(Read(local), data);
     EXPECT_EQ(peer.Logins(1), 1);
-}
-
-// The process may not write files beyond a size while it lives: writes past it
-// fail as on a full disk.
-class FileSizeLimit {
-public:
-    explicit FileSizeLimit(rlim_t bytes) {
-        getrlimit(RLIMIT_FSIZE, &saved_);
-        previous_ = std::signal(SIGXFSZ, SIG_IGN);
-        rlimit limit = saved_;
-        limit.rlim_cur = bytes;
-        setrlimit(RLIMIT_FSIZE, &limit);
-    }
-    ~FileSizeLimit() {
-        setrlimit(RLIMIT_FSIZE, &saved_);
-        std::signal(SIGXFSZ, previous_);
-    }
-
-private:
-    rlimit saved_{};
-    void (*previous_)(int) = nullptr;
-};
-
-TEST_F(FtpSessionTest, FullDiskDuringDownloadLeavesOldCopy) {
-    Serve(QStringLiteral("full.dat"), RandomBytes(8 << 20));
-    const QString local = home.Write(QStringLiteral("disk/full.dat"), "old copy");
-    {
-        FileSizeLimit limit(1 << 20);
-        EXPECT_FALSE(session.Download(QStringLiteral("full.dat"), local));
-    }
-    EXPECT_TRUE(session.LastError().startsWith(QStringLiteral("FtpGetFile Error\r\n")));
-    EXPECT_EQ(Read(local), QByteArray("old copy"));
-    EXPECT_EQ(QDir(home.File(QStringLiteral("disk"))).entryList(QDir::Files | QDir::Hidden),
-              QStringList{QStringLiteral("full.dat")});
 }
 
 TEST_F(FtpSessionTest, RemoteFileBeyondFourGigabytesHasItsTrueSize) {

@@ -5,6 +5,7 @@
 #include <QProcess>
 #include <QString>
 #include <QStringList>
+#include <QTemporaryDir>
 
 namespace quorvel::testing {
 
@@ -22,17 +23,22 @@ public:
     int CountInLog(const QString& text, int expected);
 
 private:
+    QString LogFile() const;
+
+    QTemporaryDir logDir_;
     QProcess process_;
     int port_ = 0;
-    QString log_;
 };
 
-// An FTP server with user "logger" and password "secret" over a root folder.
+// An FTP server with user "logger" and password "secret" over a root folder,
+// with the faults of ftp_peer.py given as a JSON list.
 class FtpPeer : public PeerProcess {
 public:
-    bool Start(const QString& root, int port = 0);
+    bool Start(const QString& root, int port = 0, const QByteArray& faults = "[]");
     QString Server() const { return QStringLiteral("127.0.0.1:") + QString::number(Port()); }
     int Logins(int expected) { return CountInLog(QStringLiteral(" logged in."), expected); }
+    // The commands received so far, in order, waiting (bounded) for `expected` of them.
+    QStringList Commands(int expected = 0);
 };
 
 } // namespace quorvel::testing

@@ -1,4 +1,5 @@
 // Zip packaging: names, codes, and archives written and read on disk.
+#include "common/full_disk.h"
 #include "common/recorders.h"
 #include "transfer/zip_archive.h"
 #include "transfer/zip_codes.h"
@@ -9,7 +10,11 @@
 
 #include <QDir>
 #include <QFile>
+#include <QProcess>
+#include <QRegularExpression>
+#include <QStorageInfo>
 #include <QTemporaryDir>
+#include <QtEndian>
 
 #include <gtest/gtest.h>
 
@@ -58,8 +63,13 @@ TEST(ZipNames, FollowTheDescribedExamples) {
     EXPECT_EQ(ZipFileName(QStringLiteral("data.csv")), QStringLiteral("data_csv.zip"));
     EXPECT_EQ(ZipFileName(QStringLiteral("*.dat")), QStringLiteral("AllFiles_dat.zip"));
     EXPECT_EQ(ZipFileName(QStringLiteral("*.*")), QStringLiteral("AllFiles_AllFiles.zip"));
+    // Only the file name's dots: a dotted folder is where the zip must go.
     EXPECT_EQ(ZipFileName(QStringLiteral("C:\\Logger.Data\\site1.dat")),
-              QStringLiteral("C:\\Logger_Data\\site1_dat.zip"));
+              QStringLiteral("C:\\Logger.Data\\site1_dat.zip"));
+    EXPECT_EQ(ZipFileName(QStringLiteral("/home/first.last/site1.dat")),
+              QStringLiteral("/home/first.last/site1_dat.zip"));
+    EXPECT_EQ(ZipFileName(QStringLiteral("/data.d/*.*")),
+              QStringLiteral("/data.d/AllFiles_AllFiles.zip"));
     EXPECT_EQ(ZipErrorText(999, QStringLiteral("Zip")), QStringLiteral("Zip:Error 999 occured"));
     EXPECT_EQ(ZipErrorText(150, QStringLiteral("UnZip")),
               QStringLiteral("UnZip:Full disk was inserted instead of an empty one"));
@@ -161,6 +171,145 @@ TEST_F(ZipTest, EntriesInFoldersAreExtractedBelowTheTarget) {
         MakeArchive(QStringLiteral("tree.zip"), {{"sub/", ""}, {"sub/x.dat", "x"}});
     EXPECT_EQ(UnzipFile(archive, dir.filePath(QStringLiteral("t"))), kZipOk);
     EXPECT_EQ(Read(dir.filePath(QStringLiteral("t/sub/x.dat"))), QByteArray("x"));
+}
+
+TEST_F(ZipTest, DataFileInADottedFolderTravelsZipped) {
+    const QByteArray data = LoggerText(200);
+    const QString local = Write(QStringLiteral("first.last/site1.dat"), data);
+    const ZipStepResult zipped = ZipForUpload(local, nullptr);
+    EXPECT_EQ(zipped.code, kZipOk);
+    EXPECT_EQ(zipped.zipFile, dir.filePath(QStringLiteral("first.last/site1_dat.zip")));
+    Write(QStringLiteral("first.last/site1.dat"), "older");
+    EXPECT_EQ(UnzipAfterDownload(zipped.zipFile, nullptr), kZipOk);
+    EXPECT_EQ(Read(local), data);
+}
+
+TEST_F(ZipTest, ArchivesThatInfoZipAcceptsAreExtracted) {
+    const QByteArray data = LoggerText(3000);
+    Write(QStringLiteral("src/site.dat"), data);
+    // Written to a pipe: sizes and checksums follow each entry's data.
+    QProcess zip;
+    zip.setWorkingDirectory(dir.filePath(QStringLiteral("src")));
+    zip.start(QStringLiteral("sh"),
+              {QStringLiteral("-c"), QStringLiteral("zip -q - site.dat | cat > ../piped.zip")});
+    ASSERT_TRUE(zip.waitForFinished(30000) && zip.exitCode() == 0);
+    EXPECT_EQ(
+        UnzipFile(dir.filePath(QStringLiteral("piped.zip")), dir.filePath(QStringLiteral("p"))),
+        kZipOk);
+    EXPECT_EQ(Read(dir.filePath(QStringLiteral("p/site.dat"))), data);
+
+    // "./" names the target folder itself.
+    const QString dotted =
+        MakeArchive(QStringLiteral("dotted.zip"), {{"./", ""}, {"./site.dat", "d"}});
+    EXPECT_EQ(UnzipFile(dotted, dir.filePath(QStringLiteral("d"))), kZipOk);
+    EXPECT_EQ(Read(dir.filePath(QStringLiteral("d/site.dat"))), QByteArray("d"));
+    EXPECT_EQ(SafeEntryPath(dir.filePath(QStringLiteral("d")), QStringLiteral("./")),
+              dir.filePath(QStringLiteral("d")) + QStringLiteral("/"));
+}
+
+// Sets the uncompressed size of the archive's only entry in both headers.
+void ClaimSize(QByteArray& archive, quint32 size) {
+    const qsizetype local = archive.indexOf("PK\x03\x04");
+    const qsizetype central = archive.indexOf("PK\x01\x02");
+    ASSERT_TRUE(local >= 0 && central > local);
+    qToLittleEndian<quint32>(size, archive.data() + local + 22);
+    qToLittleEndian<quint32>(size, archive.data() + central + 24);
+}
+
+TEST_F(ZipTest, EntryLongerThanItsHeaderSaysIsRefusedAtThatSize) {
+    const QString old = Write(QStringLiteral("out/bomb.dat"), "older copy");
+    QByteArray bytes =
+        Read(MakeArchive(QStringLiteral("bomb.zip"), {{"bomb.dat", QByteArray(10 << 20, '\0')}}));
+    ClaimSize(bytes, 1000);
+    const QString archive = Write(QStringLiteral("bomb.zip"), bytes);
+    EXPECT_EQ(UnzipFile(archive, dir.filePath(QStringLiteral("out"))), kZipCorruptEntry);
+    EXPECT_EQ(Read(old), QByteArray("older copy"));
+    EXPECT_EQ(QDir(dir.filePath(QStringLiteral("out"))).entryList(QDir::Files | QDir::Hidden),
+              QStringList{QStringLiteral("bomb.dat")});
+}
+
+TEST_F(ZipTest, ArchiveLargerThanTheFreeSpaceIsRefusedBeforeAnythingIsWritten) {
+    QByteArray bytes = Read(
+        MakeArchive(QStringLiteral("huge.zip"), {{"a.dat", "a"}, {"huge.dat", LoggerText(10)}}));
+    // The second entry claims close to 4 GiB, in both headers; the first is honest.
+    const qsizetype local = bytes.indexOf("PK\x03\x04", 1);
+    const qsizetype central = bytes.lastIndexOf("PK\x01\x02");
+    qToLittleEndian<quint32>(0xFFFFFFF0u, bytes.data() + local + 22);
+    qToLittleEndian<quint32>(0xFFFFFFF0u, bytes.data() + central + 24);
+    const QString archive = Write(QStringLiteral("huge.zip"), bytes);
+
+    testing::FullDisk disk(8 << 20);
+    const QString old = disk.Write(QStringLiteral("a.dat"), "older a");
+    const auto outcome = disk.Run([&] {
+        const int code = UnzipFile(archive, disk.Path());
+        return testing::FullDisk::Outcome{code == kZipNoRoom, QString::number(code)};
+    });
+    if (disk.Mounted() || QStorageInfo(disk.Path()).bytesAvailable() < 0xFFFFFFF0ll) {
+        EXPECT_TRUE(outcome.ok) << outcome.text.toStdString();
+        EXPECT_EQ(disk.Read(QStringLiteral("a.dat")), QByteArray("older a"));
+        EXPECT_EQ(disk.Files(), QStringList{QStringLiteral("a.dat")});
+    }
+    EXPECT_EQ(ZipErrorText(kZipNoRoom, QStringLiteral("UnZip")),
+              QStringLiteral(
+                  "UnZip:Not enough free space for the files of the ZIP file - nothing extracted"));
+}
+
+TEST_F(ZipTest, FullDiskLeavesEveryOlderCopyWhole) {
+    const QString archive = dir.filePath(QStringLiteral("site.zip"));
+    ASSERT_EQ(ZipFiles({Write(QStringLiteral("site.dat"), LoggerText(300))}, archive), kZipOk);
+    testing::FullDisk disk;
+    disk.Write(QStringLiteral("site.dat"), "older copy");
+    disk.Fill();
+    const auto outcome = disk.Run([&] {
+        const int code = UnzipFile(archive, disk.Path());
+        return testing::FullDisk::Outcome{IsZipError(code), QString::number(code)};
+    });
+    EXPECT_TRUE(outcome.ok) << outcome.text.toStdString();
+    EXPECT_EQ(disk.Read(QStringLiteral("site.dat")), QByteArray("older copy"));
+    EXPECT_EQ(disk.Files(), QStringList{QStringLiteral("site.dat")});
+}
+
+TEST_F(ZipTest, PackingOntoAFullDiskKeepsTheOlderArchive) {
+    testing::FullDisk disk;
+    const QString data = disk.Write(QStringLiteral("site.dat"), LoggerText(2000));
+    const QString older = disk.Write(QStringLiteral("site_dat.zip"), "older archive");
+    disk.Fill(4096);
+    const auto outcome = disk.Run([&] {
+        const int code = ZipFiles({data}, older);
+        return testing::FullDisk::Outcome{IsZipError(code), QString::number(code)};
+    });
+    EXPECT_TRUE(outcome.ok) << outcome.text.toStdString();
+    EXPECT_EQ(disk.Read(QStringLiteral("site_dat.zip")), QByteArray("older archive"));
+    EXPECT_EQ(disk.Files(),
+              (QStringList{QStringLiteral("site.dat"), QStringLiteral("site_dat.zip")}));
+}
+
+TEST_F(ZipTest, FullDiskMidwayKeepsTheFileItMetWhole) {
+    // The free space covers the sizes the entries declare but not the disk
+    // blocks they take, so the disk fills part-way through the archive.
+    QList<QPair<QByteArray, QByteArray>> entries;
+    for (int i = 0; i < 60; ++i)
+        entries.append(
+            {"f" + QByteArray::number(100 + i) + ".dat", QByteArray(4097, 'a' + i % 26)});
+    const QString archive = MakeArchive(QStringLiteral("many.zip"), entries);
+    testing::FullDisk disk;
+    for (int i = 50; i < 60; ++i)
+        disk.Write(QStringLiteral("f%1.dat").arg(100 + i), "old");
+    disk.Fill(disk.Mounted() ? 300 * 1024 : 100);
+    const auto outcome = disk.Run([&] {
+        const int code = UnzipFile(archive, disk.Path());
+        return testing::FullDisk::Outcome{code == kZipWriteProblem, QString::number(code)};
+    });
+    EXPECT_TRUE(outcome.ok) << outcome.text.toStdString();
+    const QStringList files = disk.Files();
+    EXPECT_EQ(files.filter(QRegularExpression(QStringLiteral("^f1[0-5][0-9]\\.dat$"))), files);
+    for (int i = 0; i < 60; ++i) {
+        const QString name = QStringLiteral("f%1.dat").arg(100 + i);
+        if (!files.contains(name)) continue;
+        const QByteArray now = disk.Read(name);
+        EXPECT_TRUE(now == entries[i].second || (i >= 50 && now == "old")) << i;
+    }
+    EXPECT_EQ(disk.Read(QStringLiteral("f159.dat")), QByteArray("old"));
 }
 
 } // namespace
