@@ -1,12 +1,12 @@
 #include "webdata/output_file.h"
 
+#include "support/replacing_file.h"
 #include "webdata/append_note.h"
 #include "webdata/last_line.h"
 #include "webdata/webdata_error.h"
 
 #include <QFile>
 #include <QFileInfo>
-#include <QSaveFile>
 
 namespace quorvel {
 
@@ -29,16 +29,14 @@ OutputFile::~OutputFile() {
 
 void OutputFile::Open(const QString& path, Mode mode, bool& created) {
     Abandon();
-    mode_ = mode;
     path_ = path;
     created = !QFileInfo::exists(path);
     pending_.clear();
     pending_.reserve(static_cast<std::size_t>(kGather) + 4096);
     if (mode == Mode::kReplace) {
-        auto file = std::make_unique<QSaveFile>(path);
-        if (!file->open(QIODevice::WriteOnly))
-            throw WebDataError(file->errorString() + QStringLiteral(": ") + path);
-        device_ = std::move(file);
+        auto file = std::make_unique<ReplacingFile>(path);
+        if (!file->Open()) throw WebDataError(file->ErrorText());
+        replace_ = std::move(file);
         return;
     }
     bool needsLineEnd = false;
@@ -54,7 +52,7 @@ void OutputFile::Open(const QString& path, Mode mode, bool& created) {
     // Without the note a kill could leave a torn record; the append still goes
     // on, since a failed write is cut back all the same.
     noted_ = append_note::Begin(path, whole_);
-    device_ = std::move(file);
+    append_ = std::move(file);
     if (needsLineEnd) pending_.append("\r\n");
 }
 
@@ -72,59 +70,66 @@ void OutputFile::WriteLines(QByteArrayView lines) {
     }
     // After what was gathered before it.
     Flush();
-    if (device_->write(lines.data(), lines.size()) != lines.size()) Fail(device_->errorString());
-    whole_ += lines.size();
+    Write(lines.data(), lines.size());
+}
+
+void OutputFile::Write(const char* bytes, qint64 size) {
+    const bool written = append_ ? append_->write(bytes, size) == size
+                                 : replace_->Write(QByteArrayView(bytes, size));
+    if (!written) Fail();
+    whole_ += size;
 }
 
 void OutputFile::Flush() {
-    if (pending_.empty() || !device_) return;
-    const qint64 size = static_cast<qint64>(pending_.size());
-    const qint64 written = device_->write(pending_.data(), size);
+    if (pending_.empty() || !IsOpen()) return;
+    Write(pending_.data(), static_cast<qint64>(pending_.size()));
     pending_.clear();
-    if (written != size) Fail(device_->errorString());
-    whole_ += size;
 }
 
 // Cuts an append back to its last whole record, or drops a replacing file,
 // then reports.
-void OutputFile::Fail(const QString& why) {
-    const QString path = path_;
-    if (auto* file = dynamic_cast<QFile*>(device_.get())) {
-        file->resize(whole_);
-        file->close();
-        if (noted_) append_note::End(path);
-    } else if (auto* save = dynamic_cast<QSaveFile*>(device_.get())) {
-        save->cancelWriting();
+void OutputFile::Fail() {
+    QString why;
+    if (append_) {
+        why = append_->errorString() + QStringLiteral(": ") + path_;
+        append_->resize(whole_);
+        append_->close();
+        if (noted_) append_note::End(path_);
+    } else if (replace_) {
+        why = replace_->ErrorText();
+        replace_->Cancel();
     }
-    device_.reset();
+    append_.reset();
+    replace_.reset();
     pending_.clear();
-    throw WebDataError(why + QStringLiteral(": ") + path);
+    throw WebDataError(why);
 }
 
 void OutputFile::Finish() {
-    if (auto* save = dynamic_cast<QSaveFile*>(device_.get())) {
-        if (!save->commit()) Fail(save->errorString());
+    if (replace_) {
+        if (!replace_->Commit()) Fail();
     } else {
-        device_->close();
+        append_->close();
         if (noted_) append_note::End(path_);
     }
-    device_.reset();
+    append_.reset();
+    replace_.reset();
 }
 
 void OutputFile::Close() {
-    if (!device_) return;
+    if (!IsOpen()) return;
     Flush();
     Finish();
 }
 
 void OutputFile::Abandon() {
-    if (!device_) return;
-    if (mode_ == Mode::kReplace) {
-        static_cast<QSaveFile*>(device_.get())->cancelWriting();
-        device_.reset();
+    if (replace_) {
+        replace_->Cancel();
+        replace_.reset();
         pending_.clear();
         return;
     }
+    if (!append_) return;
     Flush();
     Finish();
 }

@@ -18,9 +18,11 @@
 #include <memory>
 #include <string>
 
-class QFileDevice;
+class QFile;
 
 namespace quorvel {
+
+class ReplacingFile;
 
 class OutputFile {
 public:
@@ -29,7 +31,7 @@ public:
     OutputFile();
     ~OutputFile();
 
-    bool IsOpen() const { return device_ != nullptr; }
+    bool IsOpen() const { return append_ || replace_; }
     QString Path() const { return path_; }
     // Opens for appending (creating the file when it does not exist) or for
     // replacing. A file whose last record lacks its line end gets one first,
@@ -49,13 +51,14 @@ public:
     void Abandon();
 
 private:
+    void Write(const char* bytes, qint64 size);
     void Flush();
-    void Fail(const QString& why);
+    [[noreturn]] void Fail();
     void Finish();
 
-    Mode mode_ = Mode::kAppend;
     QString path_;
-    std::unique_ptr<QFileDevice> device_;
+    std::unique_ptr<QFile> append_;          // while appending
+    std::unique_ptr<ReplacingFile> replace_; // while replacing
     qint64 whole_ = 0;    // length of the appended file up to its last whole record
     bool noted_ = false;  // an append note was written
     std::string pending_; // clear() keeps its capacity, so gathering never reallocates
