@@ -1,6 +1,7 @@
 #include "app/app_services.h"
 
 #include "transfer/ftp.h"
+#include "webdata/display_link.h"
 #include "webdata/talu_web_data.h"
 #include "webdata/tcp_socket_control.h"
 
@@ -33,31 +34,32 @@ public:
     QString LastError() const override { return ftpLastError(); }
 };
 
+// The web-data object's texts go to whichever status view is set, if any.
+class AppServices::StatusRelay : public TraceView {
+public:
+    explicit StatusRelay(TraceView*& view) : view_(view) {}
+    void AddTrace(const QString& line) override {
+        if (view_) view_->AddTrace(line);
+    }
+    void ShowStatus(const QString& text) override {
+        if (view_) view_->ShowStatus(text);
+    }
+
+private:
+    TraceView*& view_;
+};
+
 AppServices::AppServices()
     : socket_(std::make_unique<TcpSocketControl>(1)), webData_(std::make_unique<CTALUWebData>()),
+      relay_(std::make_unique<StatusRelay>(status_)),
+      displayLink_(std::make_unique<DisplayLink>(*webData_, *relay_)),
       records_(std::make_unique<WebDataRecords>(*webData_)), files_(std::make_unique<FtpFiles>()) {
     webData_->MyWinsock(socket_.get());
-    RouteWebDataEvents();
 }
 
 AppServices::~AppServices() {
     // The FTP module must not keep pointers to displays that are going away.
     SetFTPDisplay(nullptr, nullptr);
-}
-
-void AppServices::RouteWebDataEvents() {
-    CTALUWebData* web = webData_.get();
-    auto status = [this](const QString& text) {
-        if (status_) status_->ShowStatus(text);
-    };
-    auto trace = [this](const QString& text) {
-        if (status_) status_->AddTrace(text);
-    };
-    QObject::connect(web, &CTALUWebData::Finished, web, status);
-    QObject::connect(web, &CTALUWebData::ShowStatus, web, status);
-    QObject::connect(web, &CTALUWebData::ShowLog, web, trace);
-    QObject::connect(web, &CTALUWebData::ShowReceived, web, trace);
-    // ProgressShow is not connected: the object draws its own progress.
 }
 
 void AppServices::SetViews(TraceView* status, TraceView* ftpTrace, ProgressView* transferProgress) {
@@ -84,6 +86,8 @@ void AppServices::Configure(const AccountSettings& a) {
     webData_->SetAgent(QStringLiteral("TALUQuorvel"));
     for (int i = 0; i < static_cast<int>(a.logs.size()); ++i)
         webData_->EnableLog(i, a.logs[static_cast<std::size_t>(i)] ? 1 : 0);
+    // Received text is prepared only while the trace pane shows it.
+    displayLink_->SetTracesShown(a.logs[0]);
     webData_->SetRemoteHost(a.httpServer);
     webData_->SetWebFolder(a.webFolder);
     webData_->SetFromDate(a.fromDateChoice, a.afterDate);

@@ -22,6 +22,7 @@
 namespace quorvel {
 
 class CTALUWebData;
+class DisplayLink;
 class TcpSocketControl;
 
 class AppServices : public RunServices {
@@ -61,16 +62,17 @@ public:
 private:
     class WebDataRecords;
     class FtpFiles;
+    class StatusRelay;
 
-    void RouteWebDataEvents();
-
-    std::unique_ptr<TcpSocketControl> socket_;
-    std::unique_ptr<CTALUWebData> webData_;
-    std::unique_ptr<WebDataRecords> records_;
-    std::unique_ptr<FtpFiles> files_;
     TraceView* status_ = nullptr;
     TraceView* ftpTrace_ = nullptr;
     ProgressView* transferProgress_ = nullptr;
+    std::unique_ptr<TcpSocketControl> socket_;
+    std::unique_ptr<CTALUWebData> webData_;
+    std::unique_ptr<StatusRelay> relay_;
+    std::unique_ptr<DisplayLink> displayLink_;
+    std::unique_ptr<WebDataRecords> records_;
+    std::unique_ptr<FtpFiles> files_;
 };
 
 } // namespace quorvel
