@@ -1,6 +1,7 @@
 // Quorvel: keeps data-logger files in step with the user's account on a web service.
 
 #include "app/ui/frm_web_data_client.h"
+#include "app/ui/no_display.h"
 #include "app/ui/window_ports.h"
 #include "support/cipher.h"
 #include "support/program_home.h"
@@ -60,6 +61,7 @@ int main(int argc, char* argv[]) {
         given << QString::fromLocal8Bit(argv[i]);
     if (const int code = AnswerSwitches(given); code >= 0) return code;
 
+    if (quorvel::ReportMissingDisplay(argc, argv)) return 2;
     QApplication app(argc, argv);
     QStringList args = app.arguments();
     args.removeFirst();

@@ -59,7 +59,8 @@ void frm_WebDataClient::Form_Load() {
     SetBackground(c_.Lbl_UserName, kStatusHighlight);
     SetBackground(c_.Lst_Files, kStatusHighlight);
 
-    AppSettings values = AppSettings::Defaults(ProgramHome::Folder(), QDate::currentDate().year());
+    AppSettings values = AppSettings::Defaults(ProgramHome::Folder(), QDate::currentDate().year(),
+                                               ProgramHome::DefaultDataFolder());
     const auto error = values.Load(settings_);
     recent_ = values.recentFiles;
     ApplySettings(values);
