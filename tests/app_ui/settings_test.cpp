@@ -9,6 +9,7 @@
 #include <QDate>
 #include <QDir>
 #include <QFile>
+#include <QMessageBox>
 #include <QUrl>
 
 #include <array>
@@ -123,21 +124,42 @@ TEST_F(SettingsTest, RunAtStartUpWritesAndRemovesTheAutostartEntry) {
     EXPECT_FALSE(QFile::exists(AutostartEntry()));
 }
 
-TEST_F(SettingsTest, ListIsSavedAtExitOnlyWhenChangedAndFromTheRecords) {
+TEST_F(SettingsTest, AListOnlyLoadedIsNotWrittenBackAtExit) {
     UserMaintainsList();
-    WriteList({Line("A", "a.csv")});
+    // Comment lines and the layout of a list the user wrote stay as they are.
+    WriteList({"' a list kept by hand", Line("A", "a.csv")});
     const QByteArray before = home.Read("files.txt");
     Start();
     Close();
     EXPECT_EQ(home.Read("files.txt"), before);
+    EXPECT_TRUE(unsavedAsked.isEmpty());
+}
 
-    Start();
-    C().Txt_Name->setText("Renamed");
-    window->StoreCurrentRecord();
-    // An edit not yet stored in its record is not written.
-    C().Txt_FileName->setText("edited.csv");
-    Close();
-    EXPECT_TRUE(home.Read("files.txt").contains("~Renamed~a.csv~"));
+TEST_F(SettingsTest, ClosingWithChangesAsksSaveDiscardOrCancel) {
+    struct Case {
+        int answer;
+        bool closes;
+        const char* written; // the record line's part in files.txt afterwards
+    };
+    // Save stores the fields on screen too: what the user sees is what is kept.
+    const Case cases[] = {{QMessageBox::Save, true, "~Renamed~edited.csv~"},
+                          {QMessageBox::Discard, true, "~A~a.csv~"},
+                          {QMessageBox::Cancel, false, "~A~a.csv~"}};
+    for (const Case& c : cases) {
+        UserMaintainsList();
+        WriteList({Line("A", "a.csv")});
+        Start();
+        C().Txt_Name->setText("Renamed");
+        window->StoreCurrentRecord();
+        C().Txt_FileName->setText("edited.csv");
+        unsavedAsked.clear();
+        AnswerUnsaved({c.answer});
+        EXPECT_EQ(window->close(), c.closes) << c.answer;
+        EXPECT_EQ(unsavedAsked, QStringList({"files.txt"})) << c.answer;
+        EXPECT_TRUE(home.Read("files.txt").contains(c.written)) << c.answer;
+        AnswerUnsaved({QMessageBox::Discard});
+        Close();
+    }
 }
 
 TEST_F(SettingsTest, FolderChooserStartsAtTheFieldAndFillsIt) {

@@ -10,6 +10,8 @@
 #include "support/ui/progress_bar.h"
 
 #include <QFileDialog>
+#include <QGuiApplication>
+#include <QMessageBox>
 #include <QRadioButton>
 
 namespace quorvel {
@@ -37,6 +39,17 @@ FileDialogs FileDialogs::System() {
         dialog.setDefaultSuffix(QStringLiteral("txt"));
         return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
     };
+    dialogs.saveChanges = [](QWidget* owner, const QString& listName) {
+        QMessageBox box(
+            QMessageBox::Warning, QGuiApplication::applicationDisplayName(),
+            listName.isEmpty()
+                ? QStringLiteral("The new file list has not been saved.")
+                : QStringLiteral("The file list %1 has changes that are not saved.").arg(listName),
+            QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, owner);
+        box.setInformativeText(QStringLiteral("Save them before you go on?"));
+        box.setDefaultButton(QMessageBox::Save);
+        return box.exec();
+    };
     return dialogs;
 }
 
@@ -44,6 +57,8 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     : QMainWindow(parent), scheduledStart_(HasScheduleSwitch(arguments)),
       settings_(ProgramHome::SettingsFile()), dialogs_(FileDialogs::System()) {
     setObjectName(QStringLiteral("frm_WebDataClient"));
+    // Every box and dialog of the program carries its title.
+    QGuiApplication::setApplicationDisplayName(QString::fromLatin1(kApplicationTitle));
     setWindowTitle(QStringLiteral("Quorvel"));
     BuildWindowControls(this, c_);
     for (auto* picture : c_.Pic_Route)
@@ -65,6 +80,11 @@ CTALUWebData& frm_WebDataClient::WebData() {
 }
 
 void frm_WebDataClient::Process(int which) {
+    // A command never starts while another one waits for its reply.
+    if (refreshing_) {
+        processAfterRefresh_ = which;
+        return;
+    }
     engine_->Process(which, *run_, *run_);
 }
 

@@ -62,6 +62,9 @@ struct FileDialogs {
     std::function<QString(QWidget*, const QString& title, const QString& start,
                           const QString& filter)>
         saveFile;
+    // The list has changes that are not saved: QMessageBox::Save, Discard or
+    // Cancel. listName is the list's file name, empty for a new list.
+    std::function<int(QWidget*, const QString& listName)> saveChanges;
     static FileDialogs System();
 };
 
@@ -89,6 +92,8 @@ public:
     // its last date and, when asked for, the copy at the service).
     void EnableControls();
     void RefreshFileStatus();
+    // True while RefreshFileStatus waits for the service.
+    bool RefreshingFileStatus() const { return refreshing_; }
     void AddTrace(const QString& text) override;
     void ShowStatus(const QString& text) override;
     bool ShowError(const QString& where, const QString& description);
@@ -100,6 +105,13 @@ public:
     bool LoadDataFile(const QString& path);
     void LoadFilesListBox();
     bool SaveFileList();
+    // Before the list in memory is replaced or the window closes: true when
+    // nothing is unsaved, or it was saved, or the user let it go. Asks Save /
+    // Discard / Cancel; an unattended window saves without asking.
+    bool ConfirmUnsavedList();
+    // Writes the list to its file, asking for a name when it has none; false
+    // when it was not written (cancelled or failed, after the report).
+    bool SaveListNow();
     // Writes the list when it changed; the error instead of a report.
     std::optional<AppError> SaveChangedList();
     bool StoreCurrentRecord();
@@ -144,8 +156,14 @@ public:
     const FileList& Files() const { return files_; }
     const RecentFiles& Recent() const { return recent_; }
     int CurrentRecordNumber() const { return currentRecord_; }
+    // The list entry the list highlights, -1 for none: the record operations
+    // act on it, and without one there is no current record.
+    int SelectedRow() const;
     bool StartedMinimised() const { return scheduledStart_; }
     void SetFileDialogs(FileDialogs dialogs) { dialogs_ = std::move(dialogs); }
+    // The command line of the start at log-on: "/S", and "--home DIR" when the
+    // program's home is not the one it would find by itself.
+    static QStringList StartupArguments();
 
 protected:
     void closeEvent(QCloseEvent* event) override;
@@ -166,10 +184,16 @@ private:
     void ApplySettings(const AppSettings& values);
     AppSettings CurrentSettings() const;
     void Form_QueryUnload(bool& cancel);
+    // Nobody may be there to answer: started with "/S" or the session ends.
+    bool Unattended() const { return scheduledStart_ || sessionEnding_; }
+    // Where an unattended window puts a list that has no file (or whose file
+    // cannot be written), so that it is never dropped.
+    bool RescueList();
     void Form_Unload();
     void NoteActivation(QEvent* event);
 
     // States details.
+    void RefreshFileStatusOnce();
     void ShowLocalStatus(const LocationPath& full);
     void ShowRemoteStatus(const LocationPath& full);
     void PlotRouteLines();
@@ -206,6 +230,13 @@ private:
     RecentFiles recent_;
     int currentRecord_ = 0; // record number shown in the fields, 0 for none
     bool scheduledStart_ = false;
+    bool sessionEnding_ = false;
+    // RefreshFileStatus may wait for the service; a selection during that wait
+    // asks for another refresh instead of starting an exchange inside it, and
+    // a run asked for meanwhile starts when the wait is over.
+    bool refreshing_ = false;
+    bool refreshAgain_ = false;
+    std::optional<int> processAfterRefresh_;
     bool activated_ = false;
     bool reactivate_ = false;
     LocalSettings settings_;

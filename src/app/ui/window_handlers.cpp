@@ -2,6 +2,7 @@
 
 #include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
+#include "support/program_home.h"
 #include "support/run_at_startup.h"
 #include "support/shell_open.h"
 
@@ -38,13 +39,20 @@ void frm_WebDataClient::ConnectWindowHandlers() {
                 [this, which] { Process(which); });
 }
 
+QStringList frm_WebDataClient::StartupArguments() {
+    // Started at log-on, the program must find the same settings and list.
+    QStringList arguments{QStringLiteral("/S")};
+    if (!ProgramHome::IsDefault()) arguments << QStringLiteral("--home") << ProgramHome::Folder();
+    return arguments;
+}
+
 void frm_WebDataClient::Chk_Trace_Click() {
     ShowStatus(QString());
     EnableControls();
 }
 
 void frm_WebDataClient::Chk_RunAtStartUp_Click() {
-    SetRunAtStartup(c_.Chk_RunAtStartUp->isChecked() ? 1 : 0, false, QStringLiteral("/S"));
+    SetRunAtStartup(c_.Chk_RunAtStartUp->isChecked() ? 1 : 0, false, StartupArguments());
 }
 
 void frm_WebDataClient::Cmd_ClearFiles_Click() {

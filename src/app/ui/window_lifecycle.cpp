@@ -64,12 +64,11 @@ void frm_WebDataClient::Form_Load() {
     const auto error = values.Load(settings_);
     recent_ = values.recentFiles;
     ApplySettings(values);
-    if (error) {
+    // An unreadable value took its own default; the start goes on.
+    if (error)
         ShowError(error->where.isEmpty() ? QStringLiteral("Load") : error->where,
                   error->description);
-        return;
-    }
-    c_.Chk_RunAtStartUp->setChecked(GetRunAtStartup(false, QStringLiteral("/S")) != 0);
+    c_.Chk_RunAtStartUp->setChecked(GetRunAtStartup(false, StartupArguments()) != 0);
     ConfigureRecentFiles();
     c_.Lbl_Now->setText(FormatDate(NowValue(), QString::fromLatin1(kPatternLong)));
     recent_.SetEntry(1, values.loadedFile);
@@ -120,6 +119,7 @@ AppSettings frm_WebDataClient::CurrentSettings() const {
     values.getFileList = IndexOf(c_.Opt_GetFileList);
     values.getLocalFolders = IndexOf(c_.Opt_GetLocalFolders);
     values.downloadOnly = CheckOf(c_.Chk_DownloadOnly);
+    values.recentFiles = recent_;
     return values;
 }
 
@@ -159,6 +159,11 @@ void frm_WebDataClient::Form_QueryUnload(bool& cancel) {
         // half-sent file at the service would pass for the whole one) and the
         // run writes the list itself when it ends.
         engine_->RequestStop();
+        cancel = true;
+        return;
+    }
+    // Unsaved changes: saved, let go, or the window stays open.
+    if (!ConfirmUnsavedList()) {
         cancel = true;
         return;
     }

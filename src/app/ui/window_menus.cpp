@@ -47,7 +47,9 @@ void frm_WebDataClient::mnu_File_Click(int index) {
     StoreCurrentRecord();
     switch (index) {
     case 0: {
+        if (!ConfirmUnsavedList()) break;
         files_.Clear();
+        files_.ListChanged = false;
         currentRecord_ = 0;
         const bool loading = flags_.IsLoading;
         flags_.IsLoading = true;
@@ -61,7 +63,8 @@ void frm_WebDataClient::mnu_File_Click(int index) {
     case 1: {
         const QString chosen = dialogs_.openFile(this, QStringLiteral("Open file list"),
                                                  files_.LoadedFile, kListFilter);
-        if (!chosen.isEmpty()) OpenFileList(QDir::toNativeSeparators(chosen));
+        if (!chosen.isEmpty() && ConfirmUnsavedList())
+            OpenFileList(QDir::toNativeSeparators(chosen));
         break;
     }
     case 2: {
@@ -83,7 +86,7 @@ void frm_WebDataClient::mnu_File_Click(int index) {
 }
 
 void frm_WebDataClient::mnu_RecentFile_Click(int index) {
-    if (!recent_.Entry(index).isEmpty()) OpenFileList(recent_.Entry(index));
+    if (!recent_.Entry(index).isEmpty() && ConfirmUnsavedList()) OpenFileList(recent_.Entry(index));
 }
 
 } // namespace quorvel

@@ -15,6 +15,8 @@
 #include <QFileInfo>
 #include <QRadioButton>
 
+#include <utility>
+
 namespace quorvel {
 
 namespace {
@@ -45,7 +47,7 @@ void frm_WebDataClient::EnableControls() {
     in.busy = engine_->IsBusy();
     in.support = c_.Chk_Trace->isChecked();
     in.recordEdited = flags_.RecordEdited;
-    in.selected = c_.Lst_Files->currentRow();
+    in.selected = SelectedRow();
     in.count = c_.Lst_Files->count();
     const ControlStates s = DeriveControlStates(in);
 
@@ -93,7 +95,25 @@ void frm_WebDataClient::EnableControls() {
 }
 
 void frm_WebDataClient::RefreshFileStatus() {
-    if (c_.Lst_Files->currentRow() < 0) {
+    // Asking the service waits for its reply in the event loop. A selection
+    // made meanwhile never starts a second exchange inside the first: it asks
+    // for one more refresh, which shows the latest selection when the wait is
+    // over.
+    if (refreshing_) {
+        refreshAgain_ = true;
+        return;
+    }
+    refreshing_ = true;
+    do {
+        refreshAgain_ = false;
+        RefreshFileStatusOnce();
+    } while (refreshAgain_);
+    refreshing_ = false;
+    if (const auto which = std::exchange(processAfterRefresh_, std::nullopt)) Process(*which);
+}
+
+void frm_WebDataClient::RefreshFileStatusOnce() {
+    if (currentRecord_ == 0) {
         for (int i = 0; i < 2; ++i) {
             c_.Lbl_FullFilename[i]->clear();
             SetFileStatus(c_.Lbl_FileStatus[i], QString(), false);
@@ -105,7 +125,7 @@ void frm_WebDataClient::RefreshFileStatus() {
     // exchange itself and the service is busy with it. Both are looked at
     // again when the run ends.
     const bool running = engine_->IsBusy();
-    for (int i = 0; i < 2; ++i) {
+    for (int i = 0; i < 2 && !refreshAgain_; ++i) {
         const LocationPath full = FullFilename(i);
         c_.Lbl_FullFilename[i]->setText(full.ok() ? full.path : full.refusal);
         c_.Lbl_FullFilename[i]->setToolTip(c_.Lbl_FullFilename[i]->text());
@@ -119,6 +139,8 @@ void frm_WebDataClient::RefreshFileStatus() {
                                             SelectedTypeID(), c_.chk_ShowDate[i]->isChecked())
                 : QString());
     }
+    // A selection during a wait above: the next pass shows that one.
+    if (refreshAgain_) return;
     ShowLocalStatus(FullFilename(kOnThisPc));
     if (!running)
         ShowRemoteStatus(FullFilename(kAtService));
