@@ -42,6 +42,8 @@
 
 namespace quorvel {
 
+struct ServiceAddress;
+
 class CTALUWebData : public QObject, private ReplyStream::LineSink {
     Q_OBJECT
 public:
@@ -127,6 +129,7 @@ private:
     void SendReply(const QString& line);
     // Connection.
     bool OpenConnection();
+    bool ChooseEncryption(const ServiceAddress& target);
     bool WaitForReply();
     void PumpOnce();
     QDateTime Now() const;

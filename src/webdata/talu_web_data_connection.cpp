@@ -2,6 +2,7 @@
 #include "webdata/talu_web_data.h"
 
 #include "webdata/request.h"
+#include "webdata/service_address.h"
 #include "webdata/webdata_error.h"
 
 #include <QCoreApplication>
@@ -34,10 +35,11 @@ bool CTALUWebData::OpenConnection() {
         // A close the service sent after its last reply must be seen before the
         // connection is trusted again.
         QCoreApplication::processEvents();
+        const ServiceAddress target = ParseServiceAddress(remoteHost_, remotePort_);
+        if (socket_ && !ChooseEncryption(target)) return false;
         if (socket_ && socket_->State() != kSocketConnected) {
             socket_->Close();
             stream_.Clear();
-            const HostPort target = SplitHostPort(remoteHost_, remotePort_);
             socket_->SetRemotePort(target.port);
             socket_->SetRemoteHost(target.host);
             socket_->Connect();
@@ -115,7 +117,20 @@ void CTALUWebData::Disconnect() {
     if (socket_) socket_->Close();
 }
 
+// A secure address must never be served by a plain connection: the socket
+// is switched (a connection of the other kind is closed first) or, when it
+// cannot speak TLS, nothing is sent.
+bool CTALUWebData::ChooseEncryption(const ServiceAddress& target) {
+    if (socket_->Encrypted() == target.secure || socket_->SetEncrypted(target.secure)) return true;
+    lastError_ = QStringLiteral("No secure connection to ") + target.hostPort +
+                 QStringLiteral(": this connection cannot use TLS");
+    ShowStatusText(QStringLiteral("*Not* connected to ") + remoteHost_ + QStringLiteral(": ") +
+                   lastError_);
+    return false;
+}
+
 void CTALUWebData::WError(int /*index*/, int /*number*/, const QString& description) {
+    lastError_ = description;
     ShowStatusText(QStringLiteral("WinsockError: ") + description);
     RestorePointer();
     Q_EMIT ShowStatus(description);

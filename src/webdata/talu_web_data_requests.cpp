@@ -6,6 +6,7 @@
 #include "webdata/last_line.h"
 #include "webdata/line_dates.h"
 #include "webdata/request.h"
+#include "webdata/service_address.h"
 #include "webdata/webdata_error.h"
 
 #include <QFileInfo>
@@ -99,7 +100,9 @@ void CTALUWebData::SendCommand(int commandIndex, const QString& dateText) {
         fields.fileLocation = fileLocation_;
         fields.traceServer = traceServer_;
         fields.date = dateText;
-        fields.host = remoteHost_;
+        const ServiceAddress target = ParseServiceAddress(remoteHost_, remotePort_);
+        fields.host = target.hostPort;
+        fields.scheme = ServiceScheme(target);
         fields.webFolder = webFolder_;
         fields.agent = agent_;
         for (const QString& line : RequestLines(fields))
