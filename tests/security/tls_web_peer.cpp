@@ -87,8 +87,7 @@ bool TlsWebPeer::Fail(const QString& text) {
 }
 
 QString TlsWebPeer::Address(TlsSite site, const QString& host) const {
-    return (site == TlsSite::Plain ? QStringLiteral("http://") : QStringLiteral("https://")) +
-           host + QLatin1Char(':') + QString::number(Port(site));
+    return QStringLiteral("https://") + host + QLatin1Char(':') + QString::number(Port(site));
 }
 
 QString TlsWebPeer::HostPort(TlsSite site) const {
@@ -98,6 +97,10 @@ QString TlsWebPeer::HostPort(TlsSite site) const {
 QString TlsWebPeer::Log() const {
     return ReadText(File(QStringLiteral("nginx_error.log"))) +
            ReadText(File(QStringLiteral("fpm.log"))) + ReadText(File(QStringLiteral("php.log")));
+}
+
+QString TlsWebPeer::AccessLog() const {
+    return ReadText(File(QStringLiteral("access.log")));
 }
 
 bool TlsWebPeer::Start(const QString& dataRoot) {
@@ -139,12 +142,13 @@ bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
                        "location / { return 404; }\n")
             .arg(www, dataRoot, socket);
     QString servers;
-    for (TlsSite site : {TlsSite::Good, TlsSite::Expired, TlsSite::WrongName, TlsSite::Stranger,
-                         TlsSite::Plain}) {
+    for (TlsSite site :
+         {TlsSite::Good, TlsSite::Expired, TlsSite::WrongName, TlsSite::Stranger, TlsSite::Plain}) {
         const int port = FreePort();
         ports_[site] = port;
-        servers += QStringLiteral("server {\n  listen 127.0.0.1:%1%2;\n").arg(port).arg(
-            site == TlsSite::Plain ? QString() : QStringLiteral(" ssl"));
+        servers += QStringLiteral("server {\n  listen 127.0.0.1:%1%2;\n")
+                       .arg(port)
+                       .arg(site == TlsSite::Plain ? QString() : QStringLiteral(" ssl"));
         if (const char* stem = StemOf(site))
             servers += QStringLiteral("  ssl_certificate %1/%2.pem;\n"
                                       "  ssl_certificate_key %1/%2.key;\n")
@@ -153,39 +157,38 @@ bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
     }
     const QString temp = File(QStringLiteral("tmp"));
     QDir().mkpath(temp);
-    const QString nginx =
-        QStringLiteral("%1worker_processes 1;\n"
-                       "daemon off;\n"
-                       "pid %2/nginx.pid;\n"
-                       "error_log %2/nginx_error.log warn;\n"
-                       "events { worker_connections 64; }\n"
-                       "http {\n"
-                       "  access_log off;\n"
-                       "  client_body_temp_path %3/body;\n"
-                       "  fastcgi_temp_path %3/fastcgi;\n"
-                       "  proxy_temp_path %3/proxy;\n"
-                       "  uwsgi_temp_path %3/uwsgi;\n"
-                       "  scgi_temp_path %3/scgi;\n"
-                       "  keepalive_timeout 60;\n"
-                       "%4}\n")
-            .arg(RunAsRoot() ? QStringLiteral("user root root;\n") : QString(), dir_.path(), temp,
-                 servers);
-    const QString fpm = QStringLiteral("[global]\n"
-                                       "pid = %1/fpm.pid\n"
-                                       "error_log = %1/fpm.log\n"
-                                       "daemonize = no\n"
-                                       "[quorvel]\n"
-                                       "%2"
-                                       "listen = %3\n"
-                                       "pm = static\n"
-                                       "pm.max_children = 2\n"
-                                       "php_admin_value[error_log] = %1/php.log\n"
-                                       "php_admin_flag[log_errors] = on\n"
-                                       "php_admin_value[output_buffering] = 0\n")
-                            .arg(dir_.path(),
-                                 RunAsRoot() ? QStringLiteral("user = root\ngroup = root\n")
-                                             : QString(),
-                                 socket);
+    const QString nginx = QStringLiteral("%1worker_processes 1;\n"
+                                         "daemon off;\n"
+                                         "pid %2/nginx.pid;\n"
+                                         "error_log %2/nginx_error.log warn;\n"
+                                         "events { worker_connections 64; }\n"
+                                         "http {\n"
+                                         "  log_format line '$server_port $request';\n"
+                                         "  access_log %2/access.log line;\n"
+                                         "  client_body_temp_path %3/body;\n"
+                                         "  fastcgi_temp_path %3/fastcgi;\n"
+                                         "  proxy_temp_path %3/proxy;\n"
+                                         "  uwsgi_temp_path %3/uwsgi;\n"
+                                         "  scgi_temp_path %3/scgi;\n"
+                                         "  keepalive_timeout 60;\n"
+                                         "%4}\n")
+                              .arg(RunAsRoot() ? QStringLiteral("user root root;\n") : QString(),
+                                   dir_.path(), temp, servers);
+    const QString fpm =
+        QStringLiteral("[global]\n"
+                       "pid = %1/fpm.pid\n"
+                       "error_log = %1/fpm.log\n"
+                       "daemonize = no\n"
+                       "[quorvel]\n"
+                       "%2"
+                       "listen = %3\n"
+                       "pm = static\n"
+                       "pm.max_children = 2\n"
+                       "php_admin_value[error_log] = %1/php.log\n"
+                       "php_admin_flag[log_errors] = on\n"
+                       "php_admin_value[output_buffering] = 0\n")
+            .arg(dir_.path(),
+                 RunAsRoot() ? QStringLiteral("user = root\ngroup = root\n") : QString(), socket);
     if (!WriteText(File(QStringLiteral("service.conf")), locations) ||
         !WriteText(File(QStringLiteral("nginx.conf")), nginx) ||
         !WriteText(File(QStringLiteral("fpm.conf")), fpm))

@@ -41,8 +41,8 @@ public:
     void Stop();
 
     int Port(TlsSite site) const { return ports_.value(site); }
-    // "https://localhost:PORT" ("http://" for the plain site); host may be
-    // another name for the same loopback server.
+    // "https://localhost:PORT" (also for the plain site: a plain server behind
+    // an https address); host may be another name for the same server.
     QString Address(TlsSite site, const QString& host = QStringLiteral("localhost")) const;
     // "localhost:PORT", the plain site as a plain server text.
     QString HostPort(TlsSite site) const;
@@ -50,6 +50,8 @@ public:
     QString CertFolder() const { return File(QStringLiteral("certs")); }
     QString LastError() const { return lastError_; }
     QString Log() const;
+    // Every request nginx answered so far, "PORT REQUEST-LINE" a line.
+    QString AccessLog() const;
 
 private:
     QString File(const QString& name) const { return dir_.filePath(name); }
