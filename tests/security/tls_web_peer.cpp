@@ -109,19 +109,29 @@ bool TlsWebPeer::Start(const QString& dataRoot) {
     return StartFpm() && StartNginx();
 }
 
-bool TlsWebPeer::MakeCertificates() {
-    QDir().mkpath(CertFolder());
+bool MakeTestCertificates(const QString& folder, QString& error) {
+    QDir().mkpath(folder);
     QProcess make;
     make.setProcessChannelMode(QProcess::MergedChannels);
     make.start(QStringLiteral("/usr/bin/python3"),
-               {SecurityTestDir() + QStringLiteral("/make_certs.py"), CertFolder()});
-    if (!make.waitForFinished(kStartMs) || make.exitCode() != 0)
-        return Fail(QStringLiteral("make_certs.py failed: ") + QString::fromUtf8(make.readAll()));
-    return true;
+               {SecurityTestDir() + QStringLiteral("/make_certs.py"), folder});
+    if (make.waitForFinished(kStartMs) && make.exitStatus() == QProcess::NormalExit &&
+        make.exitCode() == 0)
+        return true;
+    error = QStringLiteral("make_certs.py failed: ") + QString::fromUtf8(make.readAll());
+    return false;
+}
+
+bool TlsWebPeer::MakeCertificates() {
+    QString error;
+    return MakeTestCertificates(CertFolder(), error) || Fail(error);
 }
 
 bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
     const QString www = ReferenceService::ServerDir() + QStringLiteral("/www");
+    for (TlsSite site :
+         {TlsSite::Good, TlsSite::Expired, TlsSite::WrongName, TlsSite::Stranger, TlsSite::Plain})
+        ports_[site] = FreePort();
     const QString socket = File(QStringLiteral("fpm.sock"));
     // The locations of the deployment snippet in server/README.md.
     const QString locations =
@@ -139,13 +149,13 @@ bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
                        "location ~ ^/([A-Za-z0-9][A-Za-z0-9._-]*)/files\\.txt$ {\n"
                        "  default_type text/plain; alias %2/users/$1/files.txt;\n"
                        "}\n"
+                       "location ~ ^/to-plain/(.*)$ { return 301 http://localhost:%4/$1; }\n"
                        "location / { return 404; }\n")
-            .arg(www, dataRoot, socket);
+            .arg(www, dataRoot, socket, QString::number(ports_.value(TlsSite::Plain)));
     QString servers;
     for (TlsSite site :
          {TlsSite::Good, TlsSite::Expired, TlsSite::WrongName, TlsSite::Stranger, TlsSite::Plain}) {
-        const int port = FreePort();
-        ports_[site] = port;
+        const int port = ports_.value(site);
         servers += QStringLiteral("server {\n  listen 127.0.0.1:%1%2;\n")
                        .arg(port)
                        .arg(site == TlsSite::Plain ? QString() : QStringLiteral(" ssl"));

@@ -13,7 +13,8 @@
 //   object.SetRemoteHost(web.Address(TlsSite::Good));   // "https://localhost:PORT"
 //   TlsTrust::SetExtraCaFiles({web.CaFile()});          // trust the test's CA
 //
-// The destructor stops both servers; nothing stays running.
+// Every site also answers /to-plain/PATH with a redirect to PATH on the plain
+// site. The destructor stops both servers; nothing stays running.
 
 #include <QMap>
 #include <QProcess>
@@ -72,5 +73,7 @@ private:
 QString SecurityTestDir();
 // A loopback port nobody listens on right now.
 int FreePort();
+// Makes the certificates of make_certs.py in folder.
+bool MakeTestCertificates(const QString& folder, QString& error);
 
 } // namespace quorvel::testing
