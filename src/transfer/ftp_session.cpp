@@ -68,7 +68,10 @@ void FtpSession::SetDetails(const QString& server, const QString& user, const QS
 }
 
 QString FtpSession::ShownServer() const {
-    return MaskUrlPassword(server_);
+    QString shown = MaskUrlPassword(server_);
+    // Also where the password stands in the text in some other form.
+    if (!password_.isEmpty()) shown.replace(password_, QStringLiteral("***"));
+    return shown;
 }
 
 void FtpSession::ClearError() {

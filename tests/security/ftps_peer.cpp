@@ -9,12 +9,12 @@
 namespace quorvel::testing {
 
 bool FtpsPeer::Start(const QString& mode, const QString& root, const QString& certFolder,
-                     const QString& certStem) {
+                     const QString& certStem, const QString& password) {
     process_.setStandardErrorFile(logDir_.filePath(QStringLiteral("peer.log")));
     process_.setReadChannel(QProcess::StandardOutput);
     process_.start(QStringLiteral("/usr/bin/python3"),
                    {SecurityTestDir() + QStringLiteral("/ftps_peer.py"), mode, root,
-                    QStringLiteral("logger"), QStringLiteral("secret"),
+                    QStringLiteral("logger"), password,
                     certFolder + QLatin1Char('/') + certStem + QStringLiteral(".pem"),
                     certFolder + QLatin1Char('/') + certStem + QStringLiteral(".key")});
     if (!process_.waitForStarted(10000) || !process_.waitForReadyRead(10000)) return false;

@@ -1,6 +1,6 @@
 #pragma once
 // An FTP server over TLS (ftps_peer.py) on a loopback port for one test, with
-// user "logger" and password "secret" over a root folder.
+// user "logger" and password "secret" (unless given) over a root folder.
 
 #include <QProcess>
 #include <QString>
@@ -15,7 +15,8 @@ public:
     // mode: "implicit", "explicit" or "plain"; certStem names a certificate
     // of make_certs.py in certFolder ("good", "expired", ...).
     bool Start(const QString& mode, const QString& root, const QString& certFolder,
-               const QString& certStem = QStringLiteral("good"));
+               const QString& certStem = QStringLiteral("good"),
+               const QString& password = QStringLiteral("secret"));
     void Stop();
     int Port() const { return port_; }
     QString Log() const;
