@@ -87,4 +87,19 @@ std::unique_ptr<SecretStore> MakeDesktopSecretStore(std::chrono::milliseconds wa
     return std::make_unique<KeychainStore>(wait);
 }
 
+namespace {
+SecretStore*& ProcessStore() {
+    static SecretStore* store = nullptr;
+    return store;
+}
+} // namespace
+
+SecretStore* ProcessSecretStore() {
+    return ProcessStore();
+}
+
+void SetProcessSecretStore(SecretStore* store) {
+    ProcessStore() = store;
+}
+
 } // namespace quorvel

@@ -33,4 +33,9 @@ public:
 // The desktop's store under the service name "Quorvel".
 std::unique_ptr<SecretStore> MakeDesktopSecretStore(std::chrono::milliseconds wait);
 
+// The store the program's settings keep passwords in; null (the settings
+// file alone, as in tests) until the program sets one at start-up.
+SecretStore* ProcessSecretStore();
+void SetProcessSecretStore(SecretStore* store);
+
 } // namespace quorvel

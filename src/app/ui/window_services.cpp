@@ -5,8 +5,8 @@
 #include "support/ui/status_label.h"
 #include "transfer/ftp.h"
 #include "webdata/combo_sink.h"
+#include "webdata/service_socket_control.h"
 #include "webdata/talu_web_data.h"
-#include "webdata/tcp_socket_control.h"
 
 #include <QComboBox>
 
@@ -48,7 +48,7 @@ private:
 };
 
 WindowServices::WindowServices(frm_WebDataClient& window)
-    : window_(window), socket_(std::make_unique<TcpSocketControl>(1)),
+    : window_(window), socket_(std::make_unique<ServiceSocketControl>(1)),
       webData_(std::make_unique<CTALUWebData>()),
       ftpDisplay_(std::make_unique<FtpDisplay>(window)) {
     webData_->MyWinsock(socket_.get());

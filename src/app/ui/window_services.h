@@ -16,7 +16,7 @@ namespace quorvel {
 
 class CTALUWebData;
 class FtpDisplay;
-class TcpSocketControl;
+class ServiceSocketControl;
 class frm_WebDataClient;
 
 // What ConfigureClass copies from the window's fields.
@@ -55,7 +55,7 @@ public:
 
 private:
     frm_WebDataClient& window_;
-    std::unique_ptr<TcpSocketControl> socket_;
+    std::unique_ptr<ServiceSocketControl> socket_; // plain or TLS by the server text
     std::unique_ptr<CTALUWebData> webData_;
     std::unique_ptr<FtpDisplay> ftpDisplay_;
 };
