@@ -27,7 +27,9 @@ bool TrustedConfiguration(QSslConfiguration& config, QString& error) {
                 QStringLiteral(" hold no readable certificate");
         return false;
     }
-    config.setCaCertificates(QSslConfiguration::systemCaCertificates() + extra);
+    // The system's store is read once per run, not at every connection.
+    static const QList<QSslCertificate> system = QSslConfiguration::systemCaCertificates();
+    config.setCaCertificates(system + extra);
     return true;
 }
 
@@ -132,6 +134,15 @@ void SslSocketControl::OnEncrypted() {
 }
 
 void SslSocketControl::OnReadyRead() {
+    // QSslSocket announces every 4 KiB it decrypts; the object is told once
+    // per pass of the event loop, with everything decrypted by then.
+    if (arrivalPosted_) return;
+    arrivalPosted_ = true;
+    QMetaObject::invokeMethod(this, &SslSocketControl::AnnounceArrival, Qt::QueuedConnection);
+}
+
+void SslSocketControl::AnnounceArrival() {
+    arrivalPosted_ = false;
     const qint64 waiting = socket_.bytesAvailable();
     if (waiting > 0) Q_EMIT DataArrived(index_, waiting);
 }
@@ -141,7 +152,8 @@ void SslSocketControl::OnDisconnected() {
     // A close during the handshake is a failed connection, reported by OnError.
     if (!verified_ || failed_) return;
     peerClosed_ = true;
-    OnReadyRead();
+    // Bytes that came with the close are handed over before the close itself.
+    AnnounceArrival();
     Q_EMIT Closed(index_);
 }
 

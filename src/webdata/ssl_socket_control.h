@@ -40,6 +40,7 @@ public:
 private:
     void OnEncrypted();
     void OnReadyRead();
+    void AnnounceArrival();
     void OnDisconnected();
     void OnError(QAbstractSocket::SocketError error);
     void OnSslErrors(const QList<QSslError>& errors);
@@ -56,7 +57,8 @@ private:
     bool failed_ = false;
     bool peerClosed_ = false;
     bool closing_ = false;
-    bool verified_ = false; // the handshake of this connection succeeded
+    bool verified_ = false;      // the handshake of this connection succeeded
+    bool arrivalPosted_ = false; // an announcement of received bytes is queued
 };
 
 } // namespace quorvel
