@@ -8,6 +8,14 @@ if(QUORVEL_SANITIZE)
     add_link_options(-fsanitize=address,undefined)
 endif()
 
+# The fuzz build instruments all code for libFuzzer, ASan and UBSan; only the
+# fuzz targets themselves link libFuzzer's main.
+if(QUORVEL_FUZZ)
+    add_compile_options(-fsanitize=fuzzer-no-link,address,undefined -fno-omit-frame-pointer
+                        -fno-sanitize-recover=undefined)
+    add_link_options(-fsanitize=address,undefined)
+endif()
+
 # Adds a core library of one subsystem: no widgets, warnings as set above.
 function(quorvel_add_library name)
     cmake_parse_arguments(ARG "" "" "SOURCES;PUBLIC;PRIVATE" ${ARGN})

@@ -1,7 +1,11 @@
 // Time from the request to the closed data file for a GETDATA reply of many
-// records, served by the loopback server that run.sh starts. Environment:
+// records, served by the loopback server that run.sh starts. The object is
+// wired as the window wires it (DisplayLink, the "Status" box unticked, a
+// trace pane that drops what it is not to show). Environment:
 // WD_BENCH_HOST ("127.0.0.1:port"), WD_BENCH_FILE (the data file name the
 // server knows), WD_BENCH_DIR (where the local file is written).
+#include "support/ports.h"
+#include "webdata/display_link.h"
 #include "webdata/talu_web_data.h"
 #include "webdata/tcp_socket_control.h"
 
@@ -21,6 +25,22 @@ QString Env(const char* name) {
     return QString::fromLocal8Bit(std::getenv(name));
 }
 
+// Stands for the window's trace and status displays: like the window, it
+// keeps trace lines only while its "Status" box is ticked.
+class WindowDisplays : public quorvel::TraceView {
+public:
+    void AddTrace(const QString& line) override {
+        if (statusTicked) lines << line;
+    }
+    void ShowStatus(const QString& text) override {
+        AddTrace(QStringLiteral("Status>") + text);
+        status = text;
+    }
+    bool statusTicked = false;
+    QStringList lines;
+    QString status;
+};
+
 double PeakRssMb() {
     rusage usage{};
     getrusage(RUSAGE_SELF, &usage);
@@ -30,6 +50,9 @@ double PeakRssMb() {
 void BM_GetNewData(benchmark::State& state) {
     quorvel::TcpSocketControl socket;
     quorvel::CTALUWebData web;
+    WindowDisplays displays;
+    quorvel::DisplayLink link(web, displays);
+    link.SetTracesShown(displays.statusTicked);
     web.MyWinsock(&socket);
     web.SetRemoteHost(Env("WD_BENCH_HOST"));
     web.SetAgent(QStringLiteral("TALUQuorvel"));

@@ -10,6 +10,18 @@ namespace {
 constexpr qsizetype kControlLineLimit = 8192;
 constexpr std::int64_t kChunkLimit = std::int64_t{1} << 40;
 
+// A trailer field is "name: value" with a token for its name.
+bool IsField(QByteArrayView line) {
+    const qsizetype colon = line.indexOf(':');
+    if (colon <= 0) return false;
+    for (const char c : line.first(colon)) {
+        const bool token = (c >= '0' && c <= '9') || (c >= 'a' && c <= 'z') ||
+                           (c >= 'A' && c <= 'Z') || QByteArrayView("!#$%&'*+-.^_`|~").contains(c);
+        if (!token) return false;
+    }
+    return true;
+}
+
 int HexDigit(char c) {
     if (c >= '0' && c <= '9') return c - '0';
     if (c >= 'a' && c <= 'f') return c - 'a' + 10;
@@ -22,9 +34,15 @@ void ChunkDecoder::Reset() {
     stage_ = Stage::Size;
     remaining_ = 0;
     line_.clear();
+    givenBack_.clear();
 }
 
-ChunkDecoder::Result ChunkDecoder::EndOfLine(QByteArrayView line) {
+QByteArray ChunkDecoder::TakeGivenBack() {
+    return std::exchange(givenBack_, QByteArray());
+}
+
+ChunkDecoder::Result ChunkDecoder::EndOfLine(QByteArrayView whole) {
+    QByteArrayView line = whole;
     if (line.endsWith('\r')) line.chop(1);
     switch (stage_) {
     case Stage::Size: {
@@ -47,7 +65,8 @@ ChunkDecoder::Result ChunkDecoder::EndOfLine(QByteArrayView line) {
         stage_ = Stage::Size;
         return Result::NeedMore;
     case Stage::Trailer:
-        if (line.isEmpty()) {
+        if (line.isEmpty() || !IsField(line)) {
+            if (!line.isEmpty()) givenBack_ = whole.toByteArray() + '\n';
             stage_ = Stage::Done;
             return Result::Done;
         }

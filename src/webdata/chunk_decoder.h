@@ -17,6 +17,10 @@ public:
     // output. Done: the last chunk and its trailer have been read, and
     // consumed stops right after them.
     Result Decode(QByteArrayView input, QByteArray& output, qsizetype& consumed);
+    // A line that ended the trailer without being a trailer field (a trailer
+    // that never got its blank line): it was consumed, but belongs to what
+    // follows the body. Empty once taken.
+    QByteArray TakeGivenBack();
 
 private:
     enum class Stage { Size, Data, DataEnd, Trailer, Done };
@@ -26,6 +30,7 @@ private:
     Stage stage_ = Stage::Size;
     std::int64_t remaining_ = 0;
     QByteArray line_; // the control line read so far
+    QByteArray givenBack_;
 };
 
 } // namespace quorvel

@@ -1,6 +1,5 @@
 #include "webdata/last_line.h"
 
-#include <QFile>
 #include <QList>
 
 #include <algorithm>
@@ -15,50 +14,64 @@ bool IsLineEnd(char c) {
     return c == '\n' || c == '\r';
 }
 
-// Reads [offset, offset + size) of the file.
-bool ReadAt(QFile& file, qint64 offset, qint64 size, QByteArray& out) {
-    if (!file.seek(offset)) return false;
-    out = file.read(size);
+} // namespace
+
+bool BackwardLines::ReadAt(qint64 offset, qint64 size, QByteArray& out) {
+    if (!file_.seek(offset)) return false;
+    out = file_.read(size);
     return out.size() == size;
 }
 
-} // namespace
+bool BackwardLines::Open(const QString& name, std::optional<qint64> end) {
+    file_.setFileName(name);
+    failed_ = false;
+    if (!file_.open(QIODevice::ReadOnly)) {
+        failed_ = true;
+        return false;
+    }
+    end_ = std::min(file_.size(), end.value_or(file_.size()));
+    QByteArray last;
+    endsWithLineEnd_ = end_ == 0 || (ReadAt(end_ - 1, 1, last) && IsLineEnd(last[0]));
+    return true;
+}
 
-std::optional<LastLine> ReadLastLine(const QString& name) {
-    QFile file(name);
-    if (!file.open(QIODevice::ReadOnly)) return std::nullopt;
-    LastLine result;
-    qint64 end = file.size();
+bool BackwardLines::Previous(QByteArray& line) {
+    line.clear();
     QByteArray block;
-    // Skip the line ends (and empty lines) at the end of the file.
-    bool first = true;
-    while (end > 0) {
-        const qint64 start = std::max<qint64>(0, end - kBlock);
-        if (!ReadAt(file, start, end - start, block)) return std::nullopt;
-        if (first) {
-            result.endsWithLineEnd = IsLineEnd(block.back());
-            first = false;
-        }
+    // Skip the line ends (and empty lines) before end_.
+    while (end_ > 0) {
+        const qint64 start = std::max<qint64>(0, end_ - kBlock);
+        if (!ReadAt(start, end_ - start, block)) return !(failed_ = true);
         qsizetype i = block.size();
         while (i > 0 && IsLineEnd(block[i - 1]))
             --i;
-        end = start + i;
+        end_ = start + i;
         if (i > 0) break;
     }
+    if (end_ == 0) return false;
     // Collect the line backwards up to the line end before it.
     QList<QByteArray> pieces; // last piece first
-    while (end > 0) {
-        const qint64 start = std::max<qint64>(0, end - kBlock);
-        if (!ReadAt(file, start, end - start, block)) return std::nullopt;
+    while (end_ > 0) {
+        const qint64 start = std::max<qint64>(0, end_ - kBlock);
+        if (!ReadAt(start, end_ - start, block)) return !(failed_ = true);
         qsizetype i = block.size();
         while (i > 0 && !IsLineEnd(block[i - 1]))
             --i;
         pieces.append(block.mid(i));
+        end_ = start + i;
         if (i > 0) break;
-        end = start;
     }
     for (auto it = pieces.crbegin(); it != pieces.crend(); ++it)
-        result.line += *it;
+        line += *it;
+    return true;
+}
+
+std::optional<LastLine> ReadLastLine(const QString& name) {
+    BackwardLines lines;
+    if (!lines.Open(name)) return std::nullopt;
+    LastLine result;
+    result.endsWithLineEnd = lines.EndsWithLineEnd();
+    if (!lines.Previous(result.line) && lines.Failed()) return std::nullopt;
     return result;
 }
 

@@ -117,8 +117,21 @@ LineDate DateOfLine(const QString& line, int dataType) {
     default:
         return result;
     }
+    if (!InCalendar(result.value)) {
+        result.found = false;
+        result.value = 0;
+        return result;
+    }
     result.hasDate = true;
     return result;
+}
+
+bool InCalendar(DateValue value) {
+    static const DateValue first = MakeDate(100, 1, 1);
+    static const DateValue last = MakeDate(9999, 12, 31);
+    if (!std::isfinite(value)) return false;
+    const DateValue day = DatePart(value);
+    return day >= first && day <= last;
 }
 
 } // namespace quorvel

@@ -36,7 +36,16 @@ QStringList LineFields(const QString& line);
 
 // Reads the date of a line. A missing field or a field that is not a number
 // where one is needed throws WebDataError. Types other than 1 to 8 read no
-// date and count as found; a line of fewer than two fields is not found.
+// date and count as found; a line of fewer than two fields, or whose date lies
+// outside the calendar, is not found.
 LineDate DateOfLine(const QString& line, int dataType);
+
+// Whether the types reads a date from each line (1 to 8).
+inline bool ReadsDates(int dataType) {
+    return dataType >= kDateTime && dataType <= kTeksmart;
+}
+
+// From 1 January 100 to 31 December 9999; a date outside is no date.
+bool InCalendar(DateValue value);
 
 } // namespace quorvel

@@ -1,36 +1,58 @@
 #include "webdata/output_file.h"
 
+#include "support/replacing_file.h"
+#include "webdata/append_note.h"
 #include "webdata/last_line.h"
 #include "webdata/webdata_error.h"
 
+#include <QFile>
 #include <QFileInfo>
 
 namespace quorvel {
 
 namespace {
+// Short writes are gathered up to this size ...
 constexpr qsizetype kGather = 256 * 1024;
-}
+// ... and a run of records this long goes out as it is, without a copy.
+constexpr qsizetype kRunAsItIs = 32 * 1024;
+} // namespace
+
+OutputFile::OutputFile() = default;
 
 OutputFile::~OutputFile() {
     try {
-        Close();
+        Abandon();
     } catch (const WebDataError&) {
         // Nothing left to tell anyone at this point.
     }
 }
 
-void OutputFile::Open(const QString& path, bool& created) {
-    Close();
+void OutputFile::Open(const QString& path, Mode mode, bool& created) {
+    Abandon();
+    path_ = path;
     created = !QFileInfo::exists(path);
+    pending_.clear();
+    pending_.reserve(static_cast<std::size_t>(kGather) + 4096);
+    if (mode == Mode::kReplace) {
+        auto file = std::make_unique<ReplacingFile>(path);
+        if (!file->Open()) throw WebDataError(file->ErrorText());
+        replace_ = std::move(file);
+        return;
+    }
     bool needsLineEnd = false;
     if (!created) {
         const std::optional<LastLine> last = ReadLastLine(path);
         needsLineEnd = last && !last->endsWithLineEnd;
     }
-    file_.setFileName(path);
-    const QIODevice::OpenMode mode = created ? QIODevice::WriteOnly : QIODevice::Append;
-    if (!file_.open(mode)) throw WebDataError(file_.errorString() + QStringLiteral(": ") + path);
-    pending_.reserve(static_cast<std::size_t>(kGather) + 4096);
+    auto file = std::make_unique<QFile>(path);
+    // Unbuffered: what write() reports is what reached the file.
+    if (!file->open(QIODevice::WriteOnly | QIODevice::Append | QIODevice::Unbuffered))
+        throw WebDataError(file->errorString() + QStringLiteral(": ") + path);
+    whole_ = file->size();
+    // Without the note a kill could leave a torn record; the append still goes
+    // on, since a failed write is cut back all the same.
+    noted_ = append_note::Begin(path, whole_);
+    append_ = std::move(file);
     if (needsLineEnd) pending_.append("\r\n");
 }
 
@@ -41,37 +63,75 @@ void OutputFile::WriteLine(QByteArrayView line) {
 }
 
 void OutputFile::WriteLines(QByteArrayView lines) {
-    if (lines.size() < kGather) {
+    if (lines.size() < kRunAsItIs) {
         pending_.append(lines.data(), static_cast<std::size_t>(lines.size()));
         if (pending_.size() >= static_cast<std::size_t>(kGather)) Flush();
         return;
     }
-    // A long run goes out as it is, after what was gathered before it.
+    // After what was gathered before it.
     Flush();
-    if (file_.write(lines.data(), lines.size()) != lines.size())
-        throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
+    Write(lines.data(), lines.size());
+}
+
+void OutputFile::Write(const char* bytes, qint64 size) {
+    const bool written = append_ ? append_->write(bytes, size) == size
+                                 : replace_->Write(QByteArrayView(bytes, size));
+    if (!written) Fail();
+    whole_ += size;
 }
 
 void OutputFile::Flush() {
-    if (pending_.empty()) return;
-    const qint64 size = static_cast<qint64>(pending_.size());
-    const qint64 written = file_.write(pending_.data(), size);
-    const bool ok = written == size && file_.flush();
+    if (pending_.empty() || !IsOpen()) return;
+    Write(pending_.data(), static_cast<qint64>(pending_.size()));
     pending_.clear();
-    if (!ok) throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
+}
+
+// Cuts an append back to its last whole record, or drops a replacing file,
+// then reports.
+void OutputFile::Fail() {
+    QString why;
+    if (append_) {
+        why = append_->errorString() + QStringLiteral(": ") + path_;
+        append_->resize(whole_);
+        append_->close();
+        if (noted_) append_note::End(path_);
+    } else if (replace_) {
+        why = replace_->ErrorText();
+        replace_->Cancel();
+    }
+    append_.reset();
+    replace_.reset();
+    pending_.clear();
+    throw WebDataError(why);
+}
+
+void OutputFile::Finish() {
+    if (replace_) {
+        if (!replace_->Commit()) Fail();
+    } else {
+        append_->close();
+        if (noted_) append_note::End(path_);
+    }
+    append_.reset();
+    replace_.reset();
 }
 
 void OutputFile::Close() {
-    if (!file_.isOpen()) return;
-    try {
-        Flush();
-        if (!file_.flush())
-            throw WebDataError(file_.errorString() + QStringLiteral(": ") + file_.fileName());
-    } catch (const WebDataError&) {
-        file_.close();
-        throw;
+    if (!IsOpen()) return;
+    Flush();
+    Finish();
+}
+
+void OutputFile::Abandon() {
+    if (replace_) {
+        replace_->Cancel();
+        replace_.reset();
+        pending_.clear();
+        return;
     }
-    file_.close();
+    if (!append_) return;
+    Flush();
+    Finish();
 }
 
 } // namespace quorvel

@@ -26,6 +26,7 @@ public:
     bool SendData(const QByteArray& bytes) override { return Active().SendData(bytes); }
     QByteArray GetData() override { return Active().GetData(); }
     void Accept(std::int32_t requestId) override { Active().Accept(requestId); }
+    void Refresh() override { Active().Refresh(); }
 
 private:
     SocketControl& Active() { return secure_ ? static_cast<SocketControl&>(tls_) : plain_; }

@@ -55,6 +55,10 @@ public:
     // Every byte received and not yet taken.
     virtual QByteArray GetData() = 0;
     virtual void Accept(std::int32_t requestId) = 0;
+    // Looks at the connection now, without waiting and without an event loop:
+    // bytes waiting are announced by DataArrived, and a close that the peer
+    // sent while nobody looked shows in State and Closed.
+    virtual void Refresh() {}
 
 Q_SIGNALS:
     void Closed(int index); // the peer closed the connection

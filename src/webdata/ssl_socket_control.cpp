@@ -127,6 +127,14 @@ QByteArray SslSocketControl::GetData() {
     return socket_.readAll();
 }
 
+void SslSocketControl::Refresh() {
+    // As for plain TCP: each look decrypts what has come, the close included;
+    // what was decrypted is announced now, not on the next pass of the loop.
+    for (int look = 0; look < 8 && socket_.state() == QAbstractSocket::ConnectedState; ++look)
+        if (!socket_.waitForReadyRead(0)) break;
+    AnnounceArrival();
+}
+
 void SslSocketControl::OnEncrypted() {
     verified_ = true;
     socket_.setSocketOption(QAbstractSocket::LowDelayOption, 1);
@@ -182,7 +190,8 @@ QString SslSocketControl::Describe(QAbstractSocket::SocketError error) const {
 }
 
 void SslSocketControl::OnError(QAbstractSocket::SocketError error) {
-    if (closing_ || failed_) return;
+    // A look that found nothing (Refresh) is no failure.
+    if (closing_ || failed_ || error == QAbstractSocket::SocketTimeoutError) return;
     // After the handshake a peer closing is an ordinary close; during it, a
     // failed connection.
     if (error == QAbstractSocket::RemoteHostClosedError && verified_) return;

@@ -33,6 +33,7 @@ public:
     bool SendData(const QByteArray& bytes) override;
     QByteArray GetData() override;
     void Accept(std::int32_t) override {}
+    void Refresh() override;
 
     // "host:port" as the reports name it.
     QString Peer() const;

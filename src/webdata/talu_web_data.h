@@ -104,6 +104,10 @@ public:
     QString EncryptKey() const { return encryptKey_; }
     QString EncryptSimple(const QString& text);
 
+    // Whether an arrival of data is shown as text (ShowReceived is connected or
+    // "Receive detail" is on); without it no arrival is converted to text.
+    bool ShowsReceivedText() const;
+
     // What the last exchanges found; 0 means none.
     DateValue ServerLastDate() const { return serverLastDate_; }
     DateValue LocalLastDate() const { return localLastDate_; }
@@ -125,20 +129,26 @@ private:
 
     // Requests.
     bool DoCommand(int action);
+    void SendAction(int action);
+    QString FailureText(int action, bool connected) const;
     void SendCommand(int commandIndex, const QString& dateText);
     void SendReply(const QString& line);
     // Connection.
     bool OpenConnection();
     bool ChooseEncryption(const ServiceAddress& target);
     bool WaitForReply();
+    bool ReplyCameMeanwhile();
     void PumpOnce();
     QDateTime Now() const;
     QDateTime NextDeadline() const;
     void DropConnection();
     // Replies.
+    void TakeArrival(QByteArray data);
     ReplyStream::Next OnLine(QByteArrayView line) override;
+    ReplyStream::Framing BodyFraming() const override;
     bool TakesLinesInBulk() const override;
     qsizetype OnLines(QByteArrayView lines) override;
+    void OnDropped(QByteArrayView bytes) override;
     void ProcessReply(QByteArrayView line);
     bool ProcessBrowserReplies(QByteArrayView line);
     void ProcessStatusLine(const QString& line);
@@ -149,11 +159,11 @@ private:
     void ProcessLastDate(const QString& value);
     void ProcessUserFolders(QByteArrayView line);
     void EndReplyWithError(const QString& message);
-    void CloseOutputFile();
+    void CloseOutputFile(bool complete);
     // Dates.
     bool GetDateFromLine(const QString& line, DateValue& date);
     DateValue GetLastDateInFile(const QString& file);
-    void RefuseUndatedFile();
+    void RepairTornAppend(const QString& file);
     // Traces and reports.
     void TraceSent(const QString& text);
     void TraceReceived(const QString& text);
@@ -187,10 +197,10 @@ private:
     int httpState_ = 0;
     QString lastCommand_;
     QString lastError_;
+    QString connectError_; // why the latest connection failed, when the socket said
     QDateTime deadline_;
     DateValue serverLastDate_ = 0;
     DateValue localLastDate_ = 0;
-    bool lastRecordUndated_ = false; // the local file has records but no last date
     DateValue fromDate_ = 0;
     bool doFromDate_ = false;
     ReplyStream stream_;
@@ -202,9 +212,17 @@ private:
     bool busyShown_ = false;
     // What the head of the reply in progress announced.
     bool chunkedBody_ = false;
+    std::int64_t contentLength_ = -1; // -1: none given
     bool closeAfterReply_ = false;
     bool replyEnded_ = false;     // a final line was handled by the last OnLine
     bool dropAfterDrain_ = false; // the service closes after this reply
+    // The connection while a command runs.
+    bool inArrival_ = false;          // DataArrival is running (a box inside may nest events)
+    bool closePending_ = false;       // the peer closed while DataArrival was running
+    bool waiting_ = false;            // a request waits for its reply
+    bool closedWhileWaiting_ = false; // ... and the peer closed the connection
+    bool reused_ = false;             // the request went over a connection kept from before
+    std::int64_t replyBytes_ = 0;     // bytes received since the request
     // Progress of received records is drawn at most every few tens of milliseconds.
     std::int64_t recordsSinceProgress_ = 0;
     qint64 lastProgressMs_ = -1;

@@ -32,11 +32,15 @@ void CTALUWebData::PumpOnce() {
 bool CTALUWebData::OpenConnection() {
     try {
         if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
-        // A close the service sent after its last reply must be seen before the
-        // connection is trusted again.
+        // A close the service sent after its last reply, perhaps while nobody
+        // ran the event loop, must be seen before the connection is trusted
+        // again; bytes still waiting from before are dropped on the way.
         QCoreApplication::processEvents();
+        connectError_.clear();
         const ServiceAddress target = ParseServiceAddress(remoteHost_, remotePort_);
         if (socket_ && !ChooseEncryption(target)) return false;
+        if (socket_ && socket_->State() == kSocketConnected) socket_->Refresh();
+        reused_ = socket_ && socket_->State() == kSocketConnected;
         if (socket_ && socket_->State() != kSocketConnected) {
             socket_->Close();
             stream_.Clear();
@@ -75,18 +79,29 @@ bool CTALUWebData::WaitForReply() {
     QTimer tick;
     tick.start(kTickMs);
     for (;;) {
-        if (replyStatus_ != 0) break;
+        // A closed connection brings no more of the reply.
+        if (replyStatus_ != 0 || closedWhileWaiting_) break;
         PumpOnce();
-        if (Now() > deadline_ || userCancel_) break;
+        if (userCancel_ || (Now() > deadline_ && !ReplyCameMeanwhile())) break;
     }
+    waiting_ = false;
     replyKind_ = kNothing;
     if (replyStatus_ == 0) {
-        // The reply was cut off: its file is closed now, and whatever of it
-        // still comes can never reach a later command.
-        CloseOutputFile();
+        // The reply was cut off: its file keeps its whole records, and
+        // whatever of it still comes can never reach a later command.
+        CloseOutputFile(false);
         DropConnection();
     }
     return replyStatus_ == 1;
+}
+
+// The clock says the gap is over, but the thread may have been held up (a
+// loaded or suspended machine, a slow handler elsewhere) while the reply came:
+// the socket announces such bytes only on a later turn of the event loop. One
+// direct look at the socket before giving up; bytes found renew the deadline.
+bool CTALUWebData::ReplyCameMeanwhile() {
+    if (socket_) socket_->Refresh();
+    return replyStatus_ != 0 || closedWhileWaiting_ || Now() <= deadline_;
 }
 
 void CTALUWebData::DropConnection() {
@@ -110,11 +125,15 @@ void CTALUWebData::ConnectionRequest(int index, std::int32_t requestId) {
 }
 
 void CTALUWebData::Disconnect() {
+    if (waiting_) closedWhileWaiting_ = true;
+    // Inside DataArrival the bytes that came before the close are still to be
+    // taken; the close follows when they are.
+    if (inArrival_) {
+        closePending_ = true;
+        return;
+    }
     // Bytes of a closed connection never continue on the next one.
-    stream_.Clear();
-    chunkedBody_ = false;
-    closeAfterReply_ = false;
-    if (socket_) socket_->Close();
+    DropConnection();
 }
 
 // A secure address must never be served by a plain connection: the socket
@@ -122,15 +141,17 @@ void CTALUWebData::Disconnect() {
 // cannot speak TLS, nothing is sent.
 bool CTALUWebData::ChooseEncryption(const ServiceAddress& target) {
     if (socket_->Encrypted() == target.secure || socket_->SetEncrypted(target.secure)) return true;
-    lastError_ = QStringLiteral("No secure connection to ") + target.hostPort +
-                 QStringLiteral(": this connection cannot use TLS");
+    connectError_ = QStringLiteral("No secure connection to ") + target.hostPort +
+                    QStringLiteral(": this connection cannot use TLS");
     ShowStatusText(QStringLiteral("*Not* connected to ") + remoteHost_ + QStringLiteral(": ") +
-                   lastError_);
+                   connectError_);
     return false;
 }
 
 void CTALUWebData::WError(int /*index*/, int /*number*/, const QString& description) {
-    lastError_ = description;
+    // Why the connection failed (a refused certificate names the host and
+    // the reasons) stays for the command's LastError.
+    connectError_ = description;
     ShowStatusText(QStringLiteral("WinsockError: ") + description);
     RestorePointer();
     Q_EMIT ShowStatus(description);
@@ -146,37 +167,58 @@ void CTALUWebData::SendProgress(int /*index*/, std::int64_t bytesSent,
                QStringLiteral(" BytesRemaining: ") + QString::number(bytesRemaining));
 }
 
+bool CTALUWebData::ShowsReceivedText() const {
+    static const QMetaMethod received = QMetaMethod::fromSignal(&CTALUWebData::ShowReceived);
+    return Logging(4) || isSignalConnected(received);
+}
+
+// Takes every byte the socket holds, also those that came while a handler
+// inside ran an event loop of its own (a box): the socket does not announce
+// them again.
 void CTALUWebData::DataArrival(int /*index*/, std::int64_t bytes) {
-    if (bytes <= 0) return;
+    if (bytes <= 0 || inArrival_) return;
+    inArrival_ = true;
     try {
         if (!socket_) throw WebDataError(QStringLiteral("Object variable not set"));
-        const QByteArray data = socket_->GetData();
-        deadline_ = NextDeadline();
-        stream_.Append(data);
-        static const QMetaMethod received = QMetaMethod::fromSignal(&CTALUWebData::ShowReceived);
-        if (Logging(4) || isSignalConnected(received)) {
-            QByteArray shown = stream_.Unconsumed();
-            shown.replace("\r\n", "\n");
-            const QString text = QString::fromUtf8(shown);
-            TraceReceivedData(text);
-            Q_EMIT ShowReceived(text);
-        }
-        switch (stream_.Drain(*this)) {
-        case ReplyStream::Outcome::Ok:
-            break;
-        case ReplyStream::Outcome::LineTooLong:
-            EndReplyWithError(QStringLiteral("Received more than 1 MiB without a line end"));
-            return;
-        case ReplyStream::Outcome::BadChunking:
-            EndReplyWithError(QStringLiteral("Invalid chunked transfer coding in the reply"));
-            return;
-        }
-        if (dropAfterDrain_) {
-            dropAfterDrain_ = false;
-            DropConnection();
+        while (socket_) {
+            QByteArray data = socket_->GetData();
+            if (data.isEmpty()) break;
+            TakeArrival(std::move(data));
         }
     } catch (const WebDataError& e) {
+        inArrival_ = false;
         ErrorReport(QStringLiteral("DataArrival"), e.Description());
+    }
+    inArrival_ = false;
+    if (closePending_) {
+        closePending_ = false;
+        DropConnection();
+    } else if (dropAfterDrain_) {
+        DropConnection();
+    }
+    dropAfterDrain_ = false;
+}
+
+void CTALUWebData::TakeArrival(QByteArray data) {
+    deadline_ = NextDeadline();
+    if (waiting_) replyBytes_ += data.size();
+    stream_.Append(std::move(data));
+    if (ShowsReceivedText()) {
+        QByteArray shown = stream_.Unconsumed();
+        shown.replace("\r\n", "\n");
+        const QString text = QString::fromUtf8(shown);
+        TraceReceivedData(text);
+        Q_EMIT ShowReceived(text);
+    }
+    switch (stream_.Drain(*this)) {
+    case ReplyStream::Outcome::Ok:
+        break;
+    case ReplyStream::Outcome::LineTooLong:
+        EndReplyWithError(QStringLiteral("Received more than 1 MiB without a line end"));
+        break;
+    case ReplyStream::Outcome::BadChunking:
+        EndReplyWithError(QStringLiteral("Invalid chunked transfer coding in the reply"));
+        break;
     }
 }
 

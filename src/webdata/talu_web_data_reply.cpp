@@ -54,12 +54,27 @@ ReplyStream::Next CTALUWebData::OnLine(QByteArrayView line) {
     const int stateBefore = httpState_;
     replyEnded_ = false;
     ProcessReply(line);
-    if (stateBefore == 1 && httpState_ == 2 && chunkedBody_) return ReplyStream::Next::ChunkedBody;
-    if (replyEnded_ && closeAfterReply_) {
-        dropAfterDrain_ = true;
-        return ReplyStream::Next::Stop;
+    if (stateBefore == 1 && httpState_ == 2) return ReplyStream::Next::Body;
+    if (replyEnded_) {
+        // A body that only the close ends cannot be told from the next reply.
+        if (closeAfterReply_ || BodyFraming().kind == ReplyStream::Framing::kUntilClose)
+            dropAfterDrain_ = true;
+        return ReplyStream::Next::EndOfReply;
     }
     return ReplyStream::Next::Continue;
+}
+
+ReplyStream::Framing CTALUWebData::BodyFraming() const {
+    if (chunkedBody_) return {ReplyStream::Framing::kChunked, 0};
+    if (contentLength_ >= 0) return {ReplyStream::Framing::kLength, contentLength_};
+    return {};
+}
+
+void CTALUWebData::OnDropped(QByteArrayView bytes) {
+    if (Logging(3))
+        TraceDebug(QStringLiteral("Dropped ") + QString::number(bytes.size()) +
+                   QStringLiteral(" bytes that belong to no reply: ") +
+                   Text(bytes.first(std::min<qsizetype>(bytes.size(), 80))));
 }
 
 // Plain data lines of a GETDATA body go to the open file in runs, as long as
@@ -189,6 +204,7 @@ void CTALUWebData::ProcessStatusLine(const QString& line) {
     if (code >= 200 && code <= 300) {
         httpState_ = 1;
         chunkedBody_ = false;
+        contentLength_ = -1;
         closeAfterReply_ = words.at(0) == QLatin1String("HTTP/1.0");
         TraceDebug(QStringLiteral("ReplyCode=") + codeText + QStringLiteral(" so Ok HTTPState:") +
                    QString::number(httpState_) + QStringLiteral(" |") + line);
@@ -216,9 +232,14 @@ void CTALUWebData::ProcessHeaderLine(QByteArrayView line) {
     if (colon < 0) return;
     const QByteArray name = line.first(colon).trimmed().toByteArray().toLower();
     const QByteArray value = line.sliced(colon + 1).trimmed().toByteArray().toLower();
-    if (name == "transfer-encoding")
+    if (name == "transfer-encoding") {
         chunkedBody_ = value.contains("chunked");
-    else if (name == "connection" && value.contains("close"))
+    } else if (name == "content-length") {
+        bool ok = false;
+        const qint64 length = value.toLongLong(&ok);
+        contentLength_ = ok && length >= 0 ? length : -1;
+    }
+    if (name == "connection" && value.contains("close"))
         closeAfterReply_ = true;
     else if (name == "connection" && value.contains("keep-alive"))
         closeAfterReply_ = false;
@@ -234,7 +255,12 @@ void CTALUWebData::ProcessDataLine(QByteArrayView line, bool final, bool ok, QSt
         return;
     }
     if (output_.IsOpen()) {
-        output_.Close();
+        // A reply that ends with "NOK" keeps the records it appended, but
+        // never replaces a file.
+        if (ok)
+            output_.Close();
+        else
+            output_.Abandon();
         TraceDebug(QStringLiteral("Closing file: ") + localFile_);
         ShowStatusText(QStringLiteral("Data in: ") + localFile_);
         RestorePointer();
@@ -251,7 +277,11 @@ void CTALUWebData::ProcessDataLine(QByteArrayView line, bool final, bool ok, QSt
 void CTALUWebData::WriteDataLine(QByteArrayView line) {
     if (!output_.IsOpen()) {
         bool created = false;
-        output_.Open(localFile_, created);
+        // A file without dates is asked for all its records: they replace it.
+        output_.Open(localFile_,
+                     ReadsDates(dateFormat_) ? OutputFile::Mode::kAppend
+                                             : OutputFile::Mode::kReplace,
+                     created);
         TraceDebug((created ? QStringLiteral("Open Output file: ")
                             : QStringLiteral("Open append file: ")) +
                    localFile_);
@@ -311,7 +341,7 @@ void CTALUWebData::ProcessUserFolders(QByteArrayView line) {
 
 void CTALUWebData::EndReplyWithError(const QString& message) {
     ReportAsyncError(message);
-    CloseOutputFile();
+    CloseOutputFile(false);
     replyStatus_ = 2;
     lastError_ = message;
     Q_EMIT Finished(message);
@@ -321,9 +351,12 @@ void CTALUWebData::EndReplyWithError(const QString& message) {
     DropConnection();
 }
 
-void CTALUWebData::CloseOutputFile() {
+void CTALUWebData::CloseOutputFile(bool complete) {
     try {
-        output_.Close();
+        if (complete)
+            output_.Close();
+        else
+            output_.Abandon();
     } catch (const WebDataError& e) {
         ErrorReport(QStringLiteral("ProcessReply"), e.Description());
     }

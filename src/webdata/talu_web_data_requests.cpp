@@ -2,6 +2,7 @@
 #include "webdata/talu_web_data.h"
 
 #include "support/paths.h"
+#include "webdata/append_note.h"
 #include "webdata/date_texts.h"
 #include "webdata/last_line.h"
 #include "webdata/line_dates.h"
@@ -49,40 +50,69 @@ QString CTALUWebData::LastDateInFile(const QString& file, int locationId, int wh
 bool CTALUWebData::DoCommand(int action) {
     userCancel_ = false;
     replyStatus_ = 0;
-    if (OpenConnection()) {
-        try {
-            ShowBusy();
-            httpState_ = 0;
-            replyKind_ = kNothing;
-            switch (action) {
-            case kActionLastDate:
-                serverLastDate_ = 0;
-                replyKind_ = kLastDate;
-                SendCommand(4, {});
-                break;
-            case kActionData:
-                localLastDate_ = GetLastDateInFile(localFile_);
-                if (lastRecordUndated_) {
-                    RefuseUndatedFile();
-                    break;
-                }
-                replyKind_ = kDataLines;
-                SendCommand(2, FormatDateIso(localLastDate_));
-                break;
-            case kActionUserFolders:
-                SendCommand(11, {});
-                replyKind_ = kUser;
-                break;
-            default:
-                break;
-            }
-        } catch (const WebDataError& e) {
-            ErrorReport(QStringLiteral("DoCommand"), e.Description());
-        }
+    bool connected = false;
+    for (int attempt = 0;; ++attempt) {
+        closedWhileWaiting_ = false;
+        replyBytes_ = 0;
+        connected = OpenConnection();
+        if (connected) SendAction(action);
+        WaitForReply();
+        // A connection kept from before that the service closed before
+        // answering at all (an idle time-out meeting the request) says nothing
+        // about the request: it goes once more, on a fresh connection.
+        const bool unanswered = replyStatus_ == 0 && closedWhileWaiting_ && replyBytes_ == 0;
+        if (!(unanswered && reused_ && attempt == 0 && !userCancel_)) break;
+        TraceDebug(QStringLiteral("Connection closed before the reply; sending again"));
     }
-    const bool ok = WaitForReply();
     RestorePointer();
-    return ok;
+    if (replyStatus_ == 0) lastError_ = FailureText(action, connected);
+    return replyStatus_ == 1;
+}
+
+void CTALUWebData::SendAction(int action) {
+    try {
+        ShowBusy();
+        httpState_ = 0;
+        replyKind_ = kNothing;
+        switch (action) {
+        case kActionLastDate:
+            serverLastDate_ = 0;
+            replyKind_ = kLastDate;
+            SendCommand(4, {});
+            break;
+        case kActionData:
+            RepairTornAppend(localFile_);
+            localLastDate_ = GetLastDateInFile(localFile_);
+            replyKind_ = kDataLines;
+            SendCommand(2, FormatDateIso(localLastDate_));
+            break;
+        case kActionUserFolders:
+            SendCommand(11, {});
+            replyKind_ = kUser;
+            break;
+        default:
+            break;
+        }
+    } catch (const WebDataError& e) {
+        ErrorReport(QStringLiteral("DoCommand"), e.Description());
+    }
+}
+
+// What a command that got no final line leaves in LastError, so that an
+// earlier command's "OK" never stands for it.
+QString CTALUWebData::FailureText(int action, bool connected) const {
+    const QString command = action == kActionLastDate ? commandWords_[4]
+                            : action == kActionData   ? commandWords_[2]
+                                                      : commandWords_[11];
+    if (!connected)
+        return QStringLiteral("*Not* connected to ") + remoteHost_ +
+               (connectError_.isEmpty() ? QString() : QStringLiteral(": ") + connectError_);
+    if (userCancel_) return QStringLiteral("Cancelled (") + command + QStringLiteral(")");
+    if (closedWhileWaiting_)
+        return QStringLiteral("Connection closed before the reply ended (") + command +
+               QStringLiteral(")");
+    return QStringLiteral("No reply from ") + remoteHost_ + QStringLiteral(" (") + command +
+           QStringLiteral(")");
 }
 
 void CTALUWebData::SendCommand(int commandIndex, const QString& dateText) {
@@ -105,6 +135,9 @@ void CTALUWebData::SendCommand(int commandIndex, const QString& dateText) {
         fields.scheme = ServiceScheme(target);
         fields.webFolder = webFolder_;
         fields.agent = agent_;
+        // Whatever is left of earlier replies is no part of this one.
+        stream_.ExpectReply(*this);
+        waiting_ = true;
         for (const QString& line : RequestLines(fields))
             SendReply(line);
         lastCommand_ = fields.command;
@@ -129,13 +162,16 @@ void CTALUWebData::SendReply(const QString& line) {
     }
 }
 
-// A file that holds records but whose last record has no readable date would
-// be sent date=0, and every record the service has would be appended again.
-void CTALUWebData::RefuseUndatedFile() {
-    lastError_ = QStringLiteral("No date in the last record of ") + localFile_ +
-                 QStringLiteral(", so no data is fetched");
-    ReportAsyncError(lastError_);
-    replyStatus_ = 2;
+// An append that was killed left a torn record at the end of the file; it goes
+// before the file's last date is read.
+void CTALUWebData::RepairTornAppend(const QString& file) {
+    if (output_.IsOpen() && output_.Path() == file) return;
+    const std::optional<qint64> whole = append_note::WholeLength(file);
+    if (!whole) return;
+    if (!append_note::Repair(file))
+        throw WebDataError(QStringLiteral("Path/File access error: ") + file);
+    TraceDebug(QStringLiteral("Cut a torn record after byte ") + QString::number(*whole) +
+               QStringLiteral(" of ") + file);
 }
 
 bool CTALUWebData::GetDateFromLine(const QString& line, DateValue& date) {
@@ -154,26 +190,41 @@ bool CTALUWebData::GetDateFromLine(const QString& line, DateValue& date) {
     }
 }
 
+// The date of the last line that has one: header, blank and damaged lines at
+// the end are walked over. Only the last non-empty line reports what it lacks.
 DateValue CTALUWebData::GetLastDateInFile(const QString& file) {
     DateValue result = 0;
-    lastRecordUndated_ = false;
     TraceDebug(QStringLiteral("Finding last date in file: ") + file);
-    if (QFileInfo::exists(file)) {
-        const std::optional<LastLine> last = ReadLastLine(file);
-        if (!last) {
-            lastRecordUndated_ = true;
+    if (!QFileInfo::exists(file)) {
+        TraceDebug(QStringLiteral("File: ") + file +
+                   QStringLiteral(" does not exists, so return 0"));
+    } else if (ReadsDates(dateFormat_)) {
+        BackwardLines lines;
+        // A torn record that an append left is no line of the file.
+        if (!lines.Open(file, append_note::WholeLength(file))) {
             ErrorReport(QStringLiteral("GetLastDateInFile: ") + file,
                         QStringLiteral("Path/File access error"));
             return 0;
         }
-        DateValue date = 0;
-        if (!last->line.isEmpty() && GetDateFromLine(QString::fromUtf8(last->line), date))
-            result = date;
-        lastRecordUndated_ = !last->line.isEmpty() && result == 0 && dateFormat_ >= kDateTime &&
-                             dateFormat_ <= kTeksmart;
-    } else {
-        TraceDebug(QStringLiteral("File: ") + file +
-                   QStringLiteral(" does not exists, so return 0"));
+        QByteArray line;
+        for (bool last = true; result == 0 && lines.Previous(line); last = false) {
+            const QString text = QString::fromUtf8(line);
+            DateValue date = 0;
+            if (last) {
+                if (GetDateFromLine(text, date)) result = date;
+            } else {
+                try {
+                    const LineDate read = DateOfLine(text, dateFormat_);
+                    if (read.hasDate) result = read.value;
+                } catch (const WebDataError&) {
+                    result = 0;
+                }
+            }
+            if (result == 0 && Logging(3)) TraceDebug(QStringLiteral("No date in line: ") + text);
+        }
+        if (lines.Failed())
+            ErrorReport(QStringLiteral("GetLastDateInFile: ") + file,
+                        QStringLiteral("Path/File access error"));
     }
     localLastDate_ = result;
     TraceDebug(QStringLiteral("Last date in file: ") + file + QStringLiteral(" date: ") +

@@ -4,8 +4,10 @@ namespace quorvel {
 
 namespace {
 // Bytes the socket holds before it stops reading from the network, so that a
-// large reply never piles up in memory faster than it is consumed.
-constexpr qint64 kReadBufferLimit = 1 << 20;
+// large reply never piles up in memory faster than it is consumed. Arrivals of
+// this size reuse the same memory; larger ones each touch fresh pages, which
+// costs more than the extra turns of the event loop.
+constexpr qint64 kReadBufferLimit = 256 << 10;
 } // namespace
 
 TcpSocketControl::TcpSocketControl(int index, QObject* parent)
@@ -65,7 +67,15 @@ bool TcpSocketControl::SendData(const QByteArray& bytes) {
 }
 
 QByteArray TcpSocketControl::GetData() {
-    return socket_.readAll();
+    // Exactly what is there, in one piece: readAll grows its result by steps.
+    return socket_.read(socket_.bytesAvailable());
+}
+
+void TcpSocketControl::Refresh() {
+    // Each look reads what has come, the close included; a few looks take in
+    // bytes that came just before a close.
+    for (int look = 0; look < 8 && socket_.state() == QAbstractSocket::ConnectedState; ++look)
+        if (!socket_.waitForReadyRead(0)) break;
 }
 
 void TcpSocketControl::OnConnected() {
@@ -89,8 +99,11 @@ void TcpSocketControl::OnDisconnected() {
 }
 
 void TcpSocketControl::OnError(QAbstractSocket::SocketError error) {
-    // A peer closing is an ordinary close, not a failure.
-    if (error == QAbstractSocket::RemoteHostClosedError || closing_) return;
+    // A peer closing is an ordinary close, not a failure; a look that found
+    // nothing (Refresh) is no failure either.
+    if (error == QAbstractSocket::RemoteHostClosedError ||
+        error == QAbstractSocket::SocketTimeoutError || closing_)
+        return;
     failed_ = true;
     Q_EMIT ErrorOccurred(index_, static_cast<int>(error), socket_.errorString());
 }

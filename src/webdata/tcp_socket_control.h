@@ -23,6 +23,7 @@ public:
     QByteArray GetData() override;
     // A client socket has nothing to accept; kept for the interface.
     void Accept(std::int32_t) override {}
+    void Refresh() override;
 
 private:
     void OnConnected();

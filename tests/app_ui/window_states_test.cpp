@@ -177,6 +177,8 @@ TEST_F(WindowStatesTest, TraceAndWebDataEventsReachStatusAndTraceOneLinePerLine)
     Q_EMIT window->WebData().ShowStatus("Connecting to host");
     EXPECT_EQ(C().Lbl_status->text(), "Connecting to host");
     Q_EMIT window->WebData().ShowLog("D>Connect");
+    // Received text is connected by ConfigureClass, which runs before every exchange.
+    window->ConfigureClass();
     Q_EMIT window->WebData().ShowReceived("line 1\nline 2");
     const QStringList expected = {
         "one",    "two",   "Status>OK 3 lines", "Status>Connecting to host", "D>Connect",

@@ -1,5 +1,6 @@
 // The object's settings, defaults, lists, traces and notices.
 #include "webdata/combo_sink.h"
+#include "webdata/display_link.h"
 #include "webdata_fixture.h"
 
 namespace quorvel::testing {
@@ -62,6 +63,25 @@ TEST_F(WebDataTest, SendNewDataOnlyShowsATimedNotice) {
     EXPECT_TRUE(prompter.shown[0].message.endsWith(
         QStringLiteral(": /data/site1.dat=>site1.dat DateFormat:1")));
     EXPECT_EQ(server.connections, 0);
+}
+
+TEST_F(WebDataTest, TheWindowsLinkPreparesReceivedTextOnlyWhileTracesAreShown) {
+    RecordingTraceView view;
+    auto link = std::make_unique<DisplayLink>(web, view);
+    link->SetTracesShown(false);
+    EXPECT_FALSE(web.ShowsReceivedText());
+    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
+    ASSERT_TRUE(web.Initialise());
+    EXPECT_TRUE(view.statuses.contains(QStringLiteral("OK")));
+    EXPECT_TRUE(view.traces.isEmpty());
+
+    link->SetTracesShown(true);
+    EXPECT_TRUE(web.ShowsReceivedText());
+    server.Queue(HttpReply("a|b|c|d|e\r\nOK\r\n"));
+    ASSERT_TRUE(web.Initialise());
+    EXPECT_FALSE(view.traces.filter(QStringLiteral("a|b|c|d|e\nOK\n")).isEmpty());
+    link.reset();
+    EXPECT_FALSE(web.ShowsReceivedText());
 }
 
 TEST_F(WebDataTest, WithoutASocketCommandsFailAndAreReported) {

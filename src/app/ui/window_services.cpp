@@ -5,6 +5,7 @@
 #include "support/ui/status_label.h"
 #include "transfer/ftp.h"
 #include "webdata/combo_sink.h"
+#include "webdata/display_link.h"
 #include "webdata/service_socket_control.h"
 #include "webdata/talu_web_data.h"
 
@@ -50,17 +51,9 @@ private:
 WindowServices::WindowServices(frm_WebDataClient& window)
     : window_(window), socket_(std::make_unique<ServiceSocketControl>(1)),
       webData_(std::make_unique<CTALUWebData>()),
+      displayLink_(std::make_unique<DisplayLink>(*webData_, window)),
       ftpDisplay_(std::make_unique<FtpDisplay>(window)) {
     webData_->MyWinsock(socket_.get());
-    QObject::connect(webData_.get(), &CTALUWebData::Finished, &window,
-                     [this](const QString& text) { window_.ShowStatus(text); });
-    QObject::connect(webData_.get(), &CTALUWebData::ShowStatus, &window,
-                     [this](const QString& text) { window_.ShowStatus(text); });
-    QObject::connect(webData_.get(), &CTALUWebData::ShowLog, &window,
-                     [this](const QString& text) { window_.AddTrace(text); });
-    QObject::connect(webData_.get(), &CTALUWebData::ShowReceived, &window,
-                     [this](const QString& text) { window_.AddTrace(text); });
-    // ProgressShow is not connected: the object draws its own progress.
 }
 
 WindowServices::~WindowServices() {
@@ -87,6 +80,8 @@ void WindowServices::Configure(const WebSettings& s) {
     webData_->SetAgent(QStringLiteral("TALUQuorvel"));
     for (int i = 0; i < static_cast<int>(s.logs.size()); ++i)
         webData_->EnableLog(i, s.logs[i] ? 1 : 0);
+    // Received text is prepared only while the trace pane shows it.
+    displayLink_->SetTracesShown(s.logs[0]);
     webData_->SetRemoteHost(s.httpServer);
     webData_->SetWebFolder(s.webFolder);
     webData_->SetFromDate(s.fromDateChoice, s.afterDate);

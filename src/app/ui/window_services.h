@@ -15,6 +15,7 @@ class QComboBox;
 namespace quorvel {
 
 class CTALUWebData;
+class DisplayLink;
 class FtpDisplay;
 class ServiceSocketControl;
 class frm_WebDataClient;
@@ -57,6 +58,7 @@ private:
     frm_WebDataClient& window_;
     std::unique_ptr<ServiceSocketControl> socket_; // plain or TLS by the server text
     std::unique_ptr<CTALUWebData> webData_;
+    std::unique_ptr<DisplayLink> displayLink_;
     std::unique_ptr<FtpDisplay> ftpDisplay_;
 };
 
