@@ -13,4 +13,10 @@ struct AppError {
     bool operator==(const AppError&) const = default;
 };
 
+// The text of the common error box: the description, a line break and
+// "Quorvel:" with the procedure text.
+inline QString ErrorBoxText(const AppError& error) {
+    return error.description + QStringLiteral("\r\nQuorvel:") + error.where;
+}
+
 } // namespace quorvel

@@ -219,13 +219,4 @@ QByteArray EncodeListLine(const QString& line, bool latin1) {
     return line.toUtf8();
 }
 
-QByteArray FormatListText(const std::vector<FileRecord>& records) {
-    QByteArray text;
-    for (const FileRecord& record : records) {
-        text += FormatFileRecordLine(record).toUtf8();
-        text += "\r\n";
-    }
-    return text;
-}
-
 } // namespace quorvel

@@ -61,7 +61,4 @@ QStringList SplitListText(const QByteArray& bytes);
 // A line's bytes: Latin-1 when it was read as Latin-1 and still fits, else UTF-8.
 QByteArray EncodeListLine(const QString& line, bool latin1);
 
-// The whole file text of the records, each line ended by CR LF.
-QByteArray FormatListText(const std::vector<FileRecord>& records);
-
 } // namespace quorvel

@@ -74,7 +74,8 @@ HostPort SplitHostPort(const QString& remoteHost, int fallbackPort) {
 }
 
 bool IsGetCommand(int commandIndex) {
-    return commandIndex == 2 || commandIndex == 4 || commandIndex == 10 || commandIndex == 11;
+    return commandIndex == kCommandGetData || commandIndex == kCommandGetLastDate ||
+           commandIndex == kCommandGetFolder || commandIndex == kCommandGetUserFolders;
 }
 
 QStringList RequestLines(const RequestFields& f) {

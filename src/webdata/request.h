@@ -27,7 +27,17 @@ struct HostPort {
 };
 HostPort SplitHostPort(const QString& remoteHost, int fallbackPort);
 
-// True for the commands sent with GET (2, 4, 10, 11); every other is POST.
+// Indices into the command-word table; the index is what travels between the
+// object's steps, the word is what the service reads.
+enum CommandIndex : int {
+    kCommandSendData = 1,
+    kCommandGetData = 2,
+    kCommandGetLastDate = 4,
+    kCommandGetFolder = 10,
+    kCommandGetUserFolders = 11,
+};
+
+// True for the commands sent with GET; every other is POST.
 bool IsGetCommand(int commandIndex);
 
 struct RequestFields {

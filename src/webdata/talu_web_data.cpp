@@ -15,11 +15,11 @@ namespace quorvel {
 
 CTALUWebData::CTALUWebData(QObject* parent) : QObject(parent) {
     remotePort_ = 80;
-    commandWords_[1] = QStringLiteral("SENDDATA");
-    commandWords_[2] = QStringLiteral("GETDATA");
-    commandWords_[4] = QStringLiteral("GETLASTDATE");
-    commandWords_[10] = QStringLiteral("GETFOLDER");
-    commandWords_[11] = QStringLiteral("GETUSERFOLDERS");
+    commandWords_[kCommandSendData] = QStringLiteral("SENDDATA");
+    commandWords_[kCommandGetData] = QStringLiteral("GETDATA");
+    commandWords_[kCommandGetLastDate] = QStringLiteral("GETLASTDATE");
+    commandWords_[kCommandGetFolder] = QStringLiteral("GETFOLDER");
+    commandWords_[kCommandGetUserFolders] = QStringLiteral("GETUSERFOLDERS");
     SetEncryptKey(QStringLiteral("583640917"));
     webFolder_ = QStringLiteral("/wd");
     endProgram_ = [] { std::exit(EXIT_FAILURE); };

@@ -78,16 +78,16 @@ void CTALUWebData::SendAction(int action) {
         case kActionLastDate:
             serverLastDate_ = 0;
             replyKind_ = kLastDate;
-            SendCommand(4, {});
+            SendCommand(kCommandGetLastDate, {});
             break;
         case kActionData:
             RepairTornAppend(localFile_);
             localLastDate_ = GetLastDateInFile(localFile_);
             replyKind_ = kDataLines;
-            SendCommand(2, FormatDateIso(localLastDate_));
+            SendCommand(kCommandGetData, FormatDateIso(localLastDate_));
             break;
         case kActionUserFolders:
-            SendCommand(11, {});
+            SendCommand(kCommandGetUserFolders, {});
             replyKind_ = kUser;
             break;
         default:
@@ -101,9 +101,9 @@ void CTALUWebData::SendAction(int action) {
 // What a command that got no final line leaves in LastError, so that an
 // earlier command's "OK" never stands for it.
 QString CTALUWebData::FailureText(int action, bool connected) const {
-    const QString command = action == kActionLastDate ? commandWords_[4]
-                            : action == kActionData   ? commandWords_[2]
-                                                      : commandWords_[11];
+    const QString command = action == kActionLastDate ? commandWords_[kCommandGetLastDate]
+                            : action == kActionData   ? commandWords_[kCommandGetData]
+                                                      : commandWords_[kCommandGetUserFolders];
     if (!connected)
         return QStringLiteral("*Not* connected to ") + remoteHost_ +
                (connectError_.isEmpty() ? QString() : QStringLiteral(": ") + connectError_);

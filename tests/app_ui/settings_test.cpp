@@ -33,17 +33,9 @@ TEST_F(SettingsTest, FirstStartWithoutSettingsUsesTheDefaults) {
     EXPECT_EQ(C().Opt_GetFileList->CheckedIndex(), 1);
     EXPECT_EQ(C().Cmb_interval->currentText(), "3 hrs");
     EXPECT_EQ(C().Cmb_interval->count(), 6);
-    EXPECT_EQ(C().Lbl_LastDownload->text(), "never");
-    EXPECT_EQ(C().Txt_AfterDate->text(),
-              QStringLiteral("1 Nov %1").arg(QDate::currentDate().year()));
-    EXPECT_TRUE(C().chk_ShowDate[0]->isChecked());
     EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("files.txt"));
     EXPECT_EQ(window->windowTitle(), "TALU Quorvel");
     EXPECT_FALSE(window->StartedMinimised());
-    const QStringList tabs = {"Main", "Files", "Folders", "New Season", "Options"};
-    ASSERT_EQ(C().SSTab1->count(), tabs.size());
-    for (int i = 0; i < tabs.size(); ++i)
-        EXPECT_EQ(C().SSTab1->tabText(i), tabs[i]);
 }
 
 TEST_F(SettingsTest, FirstActivationLoadsTheListOfTheFirstRecentEntry) {

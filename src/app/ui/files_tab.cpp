@@ -172,8 +172,8 @@ QLayout* BuildFileStatusRows(WindowControls& c, QWidget* page) {
         c.Lbl_FileStatus[i] = MakeLabel(QString(), page, Indexed("Lbl_FileStatus", i));
         c.Lbl_FileStatus[i]->setAutoFillBackground(true);
         c.Lbl_FileStatus[i]->setAlignment(Qt::AlignRight | Qt::AlignVCenter);
-        c.Lbl_FileStatus[i]->setFixedWidth(90);
-        c.Lbl_LastDate[i] = MakeLabel(QString(), page, Indexed("Lbl_LastDate", i));
+        c.Lbl_FileStatus[i]->setFixedSize(90, c.Lbl_FileStatus[i]->sizeHint().height());
+        c.Lbl_LastDate[i] = MakePathLabel(Indexed("Lbl_LastDate", i), page);
         c.Lbl_LastDate[i]->setMinimumWidth(150);
         c.chk_ShowDate[i] = MakeCheck(Indexed("chk_ShowDate", i), QStringLiteral("Show"), page);
         grid->addWidget(c.Lbl_FullFilename[i], i, 1);

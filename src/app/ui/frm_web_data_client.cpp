@@ -1,9 +1,13 @@
 #include "app/ui/frm_web_data_client.h"
 
+#include "app/app_services.h"
+#include "app/run/run_engine.h"
 #include "app/ui/route_view.h"
-#include "app/ui/window_services.h"
+#include "app/ui/window_displays.h"
+#include "app/ui/window_run.h"
 #include "support/program_home.h"
 #include "support/ui/list_ops.h"
+#include "support/ui/progress_bar.h"
 
 #include <QFileDialog>
 #include <QRadioButton>
@@ -45,7 +49,10 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     for (auto* picture : c_.Pic_Route)
         picture->SetSource(c_.FilesPage, [this] { return RouteLines(); });
     c_.Frame_UserLocationID->installEventFilter(this);
-    services_ = std::make_unique<WindowServices>(*this);
+    ftpDisplay_ = std::make_unique<FtpDisplay>(c_.Lst_Trace, c_.Lbl_status);
+    services_ = std::make_unique<AppServices>();
+    engine_ = std::make_unique<RunEngine>(*services_, *this);
+    run_ = std::make_unique<WindowRun>(*this);
     ConnectHandlers();
     InstallDropTargets();
     resize(1000, 800);
@@ -55,6 +62,10 @@ frm_WebDataClient::~frm_WebDataClient() = default;
 
 CTALUWebData& frm_WebDataClient::WebData() {
     return services_->WebData();
+}
+
+void frm_WebDataClient::Process(int which) {
+    engine_->Process(which, *run_, *run_);
 }
 
 void frm_WebDataClient::ConnectHandlers() {
@@ -94,6 +105,32 @@ LocationFolders frm_WebDataClient::Folders() const {
     return folders;
 }
 
+AccountSettings frm_WebDataClient::FieldAccount() const {
+    AccountSettings a;
+    a.ftpServer = c_.Txt_ftpServer->text();
+    a.ftpUserId = c_.txt_ftpUserID->text();
+    a.ftpPassword = c_.Txt_ftpPassword->text();
+    a.ftpTrace = c_.Chk_Trace->isChecked();
+    for (std::size_t i = 0; i < a.logs.size(); ++i)
+        a.logs[i] = c_.chk_Log[i]->isChecked();
+    a.httpServer = c_.Txt_httpServer->text();
+    a.webFolder = c_.Txt_WebFolder->text();
+    a.fromDateChoice = c_.Opt_Whichdates->SelectedIndex();
+    a.afterDate = c_.Txt_AfterDate->text();
+    a.userId = c_.Txt_UserID->text();
+    a.password = c_.Txt_Password->text();
+    return a;
+}
+
+RunSettings frm_WebDataClient::FieldSettings() const {
+    RunSettings settings;
+    settings.folders = Folders();
+    settings.folders.other.clear();
+    settings.account = FieldAccount();
+    settings.downloadOnly = c_.Chk_DownloadOnly->isChecked();
+    return settings;
+}
+
 LocationPath frm_WebDataClient::FullFilename(int which) const {
     // The service side shows only the user's own folders when the file is uploaded.
     const bool userFoldersOnly = c_.Opt_Upload->SelectedIndex() != kUploadNever;
@@ -103,11 +140,11 @@ LocationPath frm_WebDataClient::FullFilename(int which) const {
 }
 
 bool frm_WebDataClient::ShowError(const QString& where, const QString& description) {
+    // A run clears its own busy state when it ends; clearing it here would let
+    // a second run start inside the first.
     flags_.IsLoading = false;
-    flags_.IsBusy = false;
     flags_.InMessage = true;
-    CurrentPrompter().MyMsgBox(description + QStringLiteral("\r\nQuorvel:") + where,
-                               kButtonsOk | kIconExclamation);
+    CurrentPrompter().MyMsgBox(ErrorBoxText({description, where}), kButtonsOk | kIconExclamation);
     return false;
 }
 

@@ -7,6 +7,7 @@
 #include "app/file_list.h"
 #include "app/locations.h"
 #include "app/recent_files.h"
+#include "app/run/run_settings.h"
 #include "app/ui/route_view.h"
 #include "app/ui/window_controls.h"
 #include "support/ini_store.h"
@@ -17,22 +18,36 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 
 class QMimeData;
 
 namespace quorvel {
 
+class AppServices;
 class CTALUWebData;
-class WindowServices;
+class FtpDisplay;
+class RunEngine;
+class WindowRun;
 struct AppSettings;
+struct FileRecord;
+struct TransferRules;
 
-// The window's flags. ListChanged lives with the file list.
+// The window's flags. ListChanged lives with the file list; IsBusy,
+// CancelRequested and LastErrorText with the run engine.
 struct WindowFlags {
-    bool IsLoading = false;       // the program fills controls; field handlers stay quiet
-    bool InMessage = false;       // a box was shown; the next activation must not initialise
-    bool IsBusy = false;          // a run is under way
-    bool CancelRequested = false; // the run stops after the current file
-    bool RecordEdited = false;    // the record fields differ from their record
+    bool IsLoading = false;    // the program fills controls; field handlers stay quiet
+    bool InMessage = false;    // a box was shown; the next activation must not initialise
+    bool RecordEdited = false; // the record fields differ from their record
+};
+
+// The file-list buttons Cmd_DoFile(0) to Cmd_DoFile(4).
+enum FileCommand : int {
+    kFileNew = 0,
+    kFileMoveUp = 1,
+    kFileMoveDown = 2,
+    kFileDelete = 3,
+    kFileSave = 4,
 };
 
 // The file dialogs, replaceable so that tests and scripted use can answer them.
@@ -66,8 +81,14 @@ public:
     bool Initialise();
     bool ConfigureClass();
 
-    // Window states, trace and status.
+    // Runs: 0 all files, 1 the file shown (RunEngine::Which).
+    void Process(int which);
+
+    // Window states, trace and status. EnableControls derives the states
+    // alone; RefreshFileStatus looks at the record's files (the local file,
+    // its last date and, when asked for, the copy at the service).
     void EnableControls();
+    void RefreshFileStatus();
     void AddTrace(const QString& text) override;
     void ShowStatus(const QString& text) override;
     bool ShowError(const QString& where, const QString& description);
@@ -79,9 +100,16 @@ public:
     bool LoadDataFile(const QString& path);
     void LoadFilesListBox();
     bool SaveFileList();
+    // Writes the list when it changed; the error instead of a report.
+    std::optional<AppError> SaveChangedList();
     bool StoreCurrentRecord();
     void ShowCurrentRecord();
     void ClearRecordFields();
+    // The record as the fields hold it now.
+    FileRecord FieldsRecord() const;
+    // The local date a run found for entry index: into the fields when they
+    // show that entry, else into its record.
+    void ShowLocalDate(int index, const QString& date);
     void AddNewFileRecord(const QString& path);
     void SaveFileName(const QString& path);
     void DoFile(int index);
@@ -100,11 +128,15 @@ public:
 
     // The folder fields as the location rules take them.
     LocationFolders Folders() const;
+    // What ConfigureClass hands to the services, and what a run takes from the fields.
+    AccountSettings FieldAccount() const;
+    RunSettings FieldSettings() const;
     // The full path of side 0 (this PC) or 1 (the service) of the current record.
     LocationPath FullFilename(int which) const;
 
     // The web-data object the window owns for the whole run.
     CTALUWebData& WebData();
+    RunEngine& Engine() { return *engine_; }
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
@@ -138,8 +170,6 @@ private:
     void NoteActivation(QEvent* event);
 
     // States details.
-    void EnableRecordControls(bool editable, bool busy, int sel, int count, bool support);
-    void ShowFileStatus(int sel);
     void ShowLocalStatus(const LocationPath& full);
     void ShowRemoteStatus(const LocationPath& full);
     void PlotRouteLines();
@@ -147,11 +177,13 @@ private:
 
     // Field handlers.
     void Txt_Name_Change();
+    void ShowTransferRules(const TransferRules& rules);
     void Opt_Download_Click(int index);
     void Opt_Upload_Click(int index);
     void Opt_MethodID_Click(int index);
     void Chk_Zip_Click();
     void Cmb_TypeID_Click();
+    void Opt_Location_Click();
     void Lst_Files_Click();
     void Cmd_ClearFiles_Click();
     void Cmd_LocateFile_Click();
@@ -162,6 +194,8 @@ private:
     void Chk_Trace_Click();
 
     void SetLoadedFile(const QString& path);
+    // StoreCurrentRecord without deriving the states.
+    void StoreFields();
     const FileRecord& RecordAt(int number) const;
     bool FileListFromUser() const;
     int SelectedTypeID() const;
@@ -176,7 +210,10 @@ private:
     bool reactivate_ = false;
     LocalSettings settings_;
     FileDialogs dialogs_;
-    std::unique_ptr<WindowServices> services_;
+    std::unique_ptr<FtpDisplay> ftpDisplay_;
+    std::unique_ptr<AppServices> services_;
+    std::unique_ptr<RunEngine> engine_;
+    std::unique_ptr<WindowRun> run_;
 };
 
 // True when the arguments hold "/S" in any letter case.

@@ -21,8 +21,26 @@ QLabel* MakeLabel(const QString& caption, QWidget* parent, const QString& name) 
     return label;
 }
 
+namespace {
+
+// Its size never follows its text, so a long text cannot widen the window and
+// a new one costs no measuring when the window lays itself out (a run changes
+// these texts for every file).
+class PathLabel : public QLabel {
+public:
+    using QLabel::QLabel;
+    QSize sizeHint() const override { return minimumSizeHint(); }
+    QSize minimumSizeHint() const override {
+        const QMargins m = contentsMargins();
+        return {0, fontMetrics().height() + m.top() + m.bottom() + 2 * margin()};
+    }
+};
+
+} // namespace
+
 QLabel* MakePathLabel(const QString& name, QWidget* parent) {
-    auto* label = MakeLabel(QString(), parent, name);
+    auto* label = new PathLabel(parent);
+    label->setObjectName(name);
     label->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
     label->setMinimumWidth(60);
     return label;
@@ -62,6 +80,8 @@ QWidget* BuildFileListColumn(WindowControls& c, QWidget* parent) {
     c.Lst_Files = new QListWidget(column);
     c.Lst_Files->setObjectName(QStringLiteral("Lst_Files"));
     c.Lst_Files->setMinimumWidth(210);
+    // One line of text each: the view need not measure every entry to place one.
+    c.Lst_Files->setUniformItemSizes(true);
     layout->addWidget(c.Lst_Files, 1);
 
     auto* buttons = new QHBoxLayout;

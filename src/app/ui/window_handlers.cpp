@@ -1,7 +1,7 @@
 // The handlers of the window's buttons and switches outside the record fields.
 
+#include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
-#include "app/ui/window_services.h"
 #include "support/run_at_startup.h"
 #include "support/shell_open.h"
 
@@ -13,9 +13,11 @@ void frm_WebDataClient::ConnectWindowHandlers() {
     auto states = [this](auto&&...) {
         if (!flags_.IsLoading) EnableControls();
     };
-    for (auto* box : c_.chk_ShowDate)
-        connect(box, &QCheckBox::stateChanged, this, states);
     connect(c_.Opt_GetFileList, &OptionButtons::Clicked, this, states);
+    for (auto* box : c_.chk_ShowDate)
+        connect(box, &QCheckBox::stateChanged, this, [this] {
+            if (!flags_.IsLoading) RefreshFileStatus();
+        });
     connect(c_.Opt_GetLocalFolders, &OptionButtons::Clicked, this, states);
     connect(c_.Chk_Trace, &QCheckBox::stateChanged, this, [this] { Chk_Trace_Click(); });
     connect(c_.Chk_RunAtStartUp, &QCheckBox::stateChanged, this,
@@ -31,6 +33,9 @@ void frm_WebDataClient::ConnectWindowHandlers() {
                 [this, i] { Cmd_LocateFolder_Click(i); });
     for (int i = 0; i < 5; ++i)
         connect(c_.Cmd_DoFile[i], &QPushButton::clicked, this, [this, i] { DoFile(i); });
+    for (int which : {RunEngine::kProcessAll, RunEngine::kProcessFile})
+        connect(c_.Cmd_Process[which], &QPushButton::clicked, this,
+                [this, which] { Process(which); });
 }
 
 void frm_WebDataClient::Chk_Trace_Click() {
@@ -52,11 +57,11 @@ void frm_WebDataClient::Cmd_ClearFiles_Click() {
     }
     ClearRecordFields();
     EnableControls();
+    RefreshFileStatus();
 }
 
 void frm_WebDataClient::Cmd_Cancel_Click() {
-    flags_.CancelRequested = true;
-    services_->Cancel();
+    engine_->Cancel();
 }
 
 void frm_WebDataClient::Cmd_EditFile_Click() {

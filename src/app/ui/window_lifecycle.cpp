@@ -1,12 +1,15 @@
 // Start-up, activation and shut-down of the window, and the settings file.
 
+#include "app/app_services.h"
 #include "app/app_settings.h"
+#include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
-#include "app/ui/window_services.h"
+#include "app/ui/window_displays.h"
 #include "support/date_value.h"
 #include "support/program_home.h"
 #include "support/run_at_startup.h"
 #include "support/ui/list_ops.h"
+#include "support/ui/progress_bar.h"
 #include "support/ui/status_label.h"
 
 #include <QApplication>
@@ -48,9 +51,11 @@ void SetBackground(QWidget* widget, const QColor& colour) {
 void frm_WebDataClient::Form_Load() {
     flags_.IsLoading = true;
     if (scheduledStart_) setWindowState(windowState() | Qt::WindowMinimized);
-    services_->Attach();
-    services_->FillIntervals(c_.Cmb_interval);
-    services_->FillDataTypes(c_.Cmb_TypeID);
+    services_->SetViews(this, ftpDisplay_.get(), c_.Pic_ProgressFTP);
+    ComboBoxSink intervals(c_.Cmb_interval);
+    services_->FillIntervals(intervals);
+    ComboBoxSink dataTypes(c_.Cmb_TypeID);
+    services_->FillDataTypes(dataTypes);
     SetBackground(c_.Lbl_UserName, kStatusHighlight);
     SetBackground(c_.Lst_Files, kStatusHighlight);
 
@@ -72,6 +77,7 @@ void frm_WebDataClient::Form_Load() {
     ConfigureClass();
     setWindowTitle(QString::fromLatin1(kApplicationTitle));
     EnableControls();
+    RefreshFileStatus();
     flags_.IsLoading = false;
 }
 
@@ -118,7 +124,8 @@ AppSettings frm_WebDataClient::CurrentSettings() const {
 
 void frm_WebDataClient::Form_Activate() {
     services_->Attach();
-    if (!flags_.InMessage && !scheduledStart_) Initialise();
+    // A return to the window during a run never reloads the list being walked.
+    if (!flags_.InMessage && !scheduledStart_ && !engine_->IsBusy()) Initialise();
     flags_.InMessage = false;
 }
 
@@ -141,27 +148,18 @@ bool frm_WebDataClient::Initialise() {
 }
 
 bool frm_WebDataClient::ConfigureClass() {
-    WebSettings web;
-    web.ftpServer = c_.Txt_ftpServer->text();
-    web.ftpUserId = c_.txt_ftpUserID->text();
-    web.ftpPassword = c_.Txt_ftpPassword->text();
-    web.ftpTrace = c_.Chk_Trace->isChecked();
-    for (int i = 0; i < 5; ++i)
-        web.logs[i] = c_.chk_Log[i]->isChecked();
-    web.httpServer = c_.Txt_httpServer->text();
-    web.webFolder = c_.Txt_WebFolder->text();
-    web.fromDateChoice = c_.Opt_Whichdates->SelectedIndex();
-    web.afterDate = c_.Txt_AfterDate->text();
-    web.userId = c_.Txt_UserID->text();
-    web.password = c_.Txt_Password->text();
-    services_->Configure(web);
+    services_->Configure(FieldAccount());
     return true;
 }
 
 void frm_WebDataClient::Form_QueryUnload(bool& cancel) {
-    if (flags_.IsBusy) {
-        flags_.CancelRequested = true;
+    if (engine_->IsBusy()) {
+        // Only asks the run to stop. The running transfer is left to end (a
+        // half-sent file at the service would pass for the whole one) and the
+        // run writes the list itself when it ends.
+        engine_->RequestStop();
         cancel = true;
+        return;
     }
     services_->CloseFtp();
     SaveFileList();

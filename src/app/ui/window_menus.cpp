@@ -55,6 +55,7 @@ void frm_WebDataClient::mnu_File_Click(int index) {
         flags_.IsLoading = loading;
         SetLoadedFile(QString());
         EnableControls();
+        RefreshFileStatus();
         break;
     }
     case 1: {

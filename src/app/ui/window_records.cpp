@@ -2,6 +2,7 @@
 // file-list buttons.
 
 #include "app/ui/frm_web_data_client.h"
+#include "app/ui/loading_scope.h"
 #include "app/ui/route_view.h"
 #include "support/paths.h"
 #include "support/ui/list_ops.h"
@@ -34,19 +35,6 @@ void SetCheckValue(QCheckBox* box, int value) {
     box->setCheckState(value != 0 ? Qt::Checked : Qt::Unchecked);
 }
 
-// Restores the IsLoading flag it found, however the procedure ends.
-class LoadingScope {
-public:
-    explicit LoadingScope(bool& flag) : flag_(flag), saved_(flag) { flag_ = true; }
-    ~LoadingScope() { flag_ = saved_; }
-    LoadingScope(const LoadingScope&) = delete;
-    LoadingScope& operator=(const LoadingScope&) = delete;
-
-private:
-    bool& flag_;
-    bool saved_;
-};
-
 } // namespace
 
 bool frm_WebDataClient::LoadDataFile(const QString& path) {
@@ -76,31 +64,51 @@ bool frm_WebDataClient::OpenFileList(const QString& path) {
     return true;
 }
 
+std::optional<AppError> frm_WebDataClient::SaveChangedList() {
+    return files_.SaveFileList(Folders());
+}
+
 bool frm_WebDataClient::SaveFileList() {
-    if (const auto error = files_.SaveFileList(Folders())) return ShowError(*error);
+    if (const auto error = SaveChangedList()) return ShowError(*error);
     return true;
 }
 
+FileRecord frm_WebDataClient::FieldsRecord() const {
+    FileRecord r = RecordAt(currentRecord_);
+    r.Active = CheckValue(c_.Chk_Active);
+    r.Name = c_.Txt_Name->text();
+    r.FileName = c_.Txt_FileName->text();
+    r.TypeID = static_cast<std::int16_t>(SelectedTypeID());
+    r.AdminLocationID = static_cast<std::int16_t>(c_.Opt_AdminLocationID->SelectedIndex());
+    r.UserLocationID = static_cast<std::int16_t>(c_.Opt_UserLocationID->SelectedIndex());
+    r.MethodID = static_cast<std::int16_t>(c_.Opt_MethodID->SelectedIndex());
+    r.Download = static_cast<std::int16_t>(c_.Opt_Download->SelectedIndex());
+    r.Upload = static_cast<std::int16_t>(c_.Opt_Upload->SelectedIndex());
+    r.Zip = CheckValue(c_.Chk_Zip);
+    r.Folder = c_.Txt_Folder->text();
+    r.FileDate = c_.Txt_FileDate->text();
+    r.FileDateLocal = c_.Txt_FileDateLocal->text();
+    return r;
+}
+
 bool frm_WebDataClient::StoreCurrentRecord() {
-    if (currentRecord_ > 0 && currentRecord_ <= files_.Count()) {
-        FileRecord& r = files_.At(currentRecord_ - 1);
-        r.Active = CheckValue(c_.Chk_Active);
-        r.Name = c_.Txt_Name->text();
-        r.FileName = c_.Txt_FileName->text();
-        r.TypeID = static_cast<std::int16_t>(SelectedTypeID());
-        r.AdminLocationID = static_cast<std::int16_t>(c_.Opt_AdminLocationID->SelectedIndex());
-        r.UserLocationID = static_cast<std::int16_t>(c_.Opt_UserLocationID->SelectedIndex());
-        r.MethodID = static_cast<std::int16_t>(c_.Opt_MethodID->SelectedIndex());
-        r.Download = static_cast<std::int16_t>(c_.Opt_Download->SelectedIndex());
-        r.Upload = static_cast<std::int16_t>(c_.Opt_Upload->SelectedIndex());
-        r.Zip = CheckValue(c_.Chk_Zip);
-        r.Folder = c_.Txt_Folder->text();
-        r.FileDate = c_.Txt_FileDate->text();
-        r.FileDateLocal = c_.Txt_FileDateLocal->text();
-    }
-    flags_.RecordEdited = false;
+    StoreFields();
     EnableControls();
     return true;
+}
+
+void frm_WebDataClient::StoreFields() {
+    // FileID and SpareNumber are the record's own; FieldsRecord keeps them.
+    if (currentRecord_ > 0 && currentRecord_ <= files_.Count())
+        files_.At(currentRecord_ - 1) = FieldsRecord();
+    flags_.RecordEdited = false;
+}
+
+void frm_WebDataClient::ShowLocalDate(int index, const QString& date) {
+    if (index == currentRecord_ - 1)
+        c_.Txt_FileDateLocal->setText(date);
+    else if (index >= 0 && index < files_.Count())
+        files_.At(index).FileDateLocal = date;
 }
 
 void frm_WebDataClient::ShowCurrentRecord() {
@@ -124,6 +132,7 @@ void frm_WebDataClient::ShowCurrentRecord() {
         flags_.RecordEdited = false;
     }
     EnableControls();
+    RefreshFileStatus();
 }
 
 void frm_WebDataClient::ClearRecordFields() {
@@ -141,20 +150,20 @@ void frm_WebDataClient::ClearRecordFields() {
 }
 
 void frm_WebDataClient::AddNewFileRecord(const QString& path) {
-    const AnalysedFilename found = AnalyseFilename(Folders(), path);
-    ListAddItem(c_.Lst_Files, found.name, 0);
-    const int index = c_.Lst_Files->currentRow();
-    if (!files_.Insert(index, NewFileRecord(found.name, static_cast<std::int16_t>(found.locationId),
-                                            found.folder))) {
-        // The list box must keep matching the records entry by entry.
-        LoadingScope loading(flags_.IsLoading);
-        ListRemoveItem(c_.Lst_Files);
+    // The fields go back into their record before the numbers move.
+    StoreCurrentRecord();
+    const int index =
+        quorvel::AddNewFileRecord(files_, Folders(), path, c_.Lst_Files->currentRow());
+    if (index < 0) {
         ShowError(QStringLiteral("AddNewFileRecord"),
                   QStringLiteral("The file list is full (%1 files)").arg(FileList::kMaxRecords));
         return;
     }
+    {
+        LoadingScope loading(flags_.IsLoading);
+        ListAddItem(c_.Lst_Files, files_.At(index).Name, 0);
+    }
     ShowCurrentRecord();
-    files_.ListChanged = true;
 }
 
 void frm_WebDataClient::DoFile(int index) {
@@ -163,7 +172,7 @@ void frm_WebDataClient::DoFile(int index) {
     LoadingScope loading(flags_.IsLoading);
     const int row = c_.Lst_Files->currentRow();
     switch (index) {
-    case 0: {
+    case kFileNew: {
         const QStringList chosen = dialogs_.openFiles(
             this, QStringLiteral("Add data files"),
             AddTrailingSlash(c_.Txt_LocalFolder[1]->text()) + c_.Txt_UserFolder->text(),
@@ -173,16 +182,16 @@ void frm_WebDataClient::DoFile(int index) {
         c_.SSTab1->setCurrentIndex(1);
         break;
     }
-    case 1:
-    case 2: {
-        const int delta = index == 1 ? -1 : 1;
+    case kFileMoveUp:
+    case kFileMoveDown: {
+        const int delta = index == kFileMoveUp ? -1 : 1;
         if (row < 0 || !files_.Move(row, delta)) break;
-        ListMoveItem(c_.Lst_Files, index == 1 ? 1 : 2);
+        ListMoveItem(c_.Lst_Files, index);
         ShowCurrentRecord();
         files_.ListChanged = true;
         break;
     }
-    case 3: {
+    case kFileDelete: {
         if (row < 0) break;
         const QString question =
             QStringLiteral("Remove '") + c_.Txt_FileName->text() + QStringLiteral("' ?");
@@ -194,7 +203,7 @@ void frm_WebDataClient::DoFile(int index) {
         files_.ListChanged = true;
         break;
     }
-    default: // 4 "Save": the fields went into the record above
+    default: // kFileSave: the fields went into the record above
         break;
     }
 }

@@ -1,8 +1,12 @@
-// The window states: every enabled and visible state is derived here from the
-// window's data, never stored.
+// The window states: every enabled and visible state is derived from the
+// window's data (DeriveControlStates), never stored. The status rows of the
+// record's two files are refreshed in a step of their own, because they look
+// at files and may ask the service.
 
+#include "app/app_services.h"
+#include "app/control_states.h"
+#include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
-#include "app/ui/window_services.h"
 #include "support/files.h"
 #include "support/texts.h"
 #include "support/ui/status_label.h"
@@ -27,34 +31,56 @@ void SetFileStatus(QLabel* label, const QString& text, bool coloured) {
     label->setPalette(palette);
 }
 
+void SetEnabled(std::initializer_list<QWidget*> widgets, bool enabled) {
+    for (QWidget* w : widgets)
+        w->setEnabled(enabled);
+}
+
 } // namespace
 
 void frm_WebDataClient::EnableControls() {
-    const bool editable = FileListFromUser();
-    const bool busy = flags_.IsBusy;
-    const int sel = c_.Lst_Files->currentRow();
-    const int count = c_.Lst_Files->count();
-    const bool support = c_.Chk_Trace->isChecked();
+    ControlInputs in;
+    in.listFromUser = FileListFromUser();
+    in.foldersFromUser = c_.Opt_GetLocalFolders->Button(0)->isChecked();
+    in.busy = engine_->IsBusy();
+    in.support = c_.Chk_Trace->isChecked();
+    in.recordEdited = flags_.RecordEdited;
+    in.selected = c_.Lst_Files->currentRow();
+    in.count = c_.Lst_Files->count();
+    const ControlStates s = DeriveControlStates(in);
 
-    EnableRecordControls(editable, busy, sel, count, support);
-
-    const bool foldersFromUser = c_.Opt_GetLocalFolders->Button(0)->isChecked();
-    for (QWidget* w :
-         {static_cast<QWidget*>(c_.Cmd_LocateFolder[1]),
-          static_cast<QWidget*>(c_.Txt_LocalFolder[1]), static_cast<QWidget*>(c_.Txt_UserFolder),
-          static_cast<QWidget*>(c_.Txt_UserCurrentFolder)})
-        w->setEnabled(foldersFromUser);
-
-    c_.Cmd_Process[0]->setEnabled(count > 0 && !busy);
-    c_.Cmd_Process[1]->setEnabled(sel >= 0 && !busy);
-    c_.Cmd_Cancel->setEnabled(busy);
-    c_.Cmd_Close->setEnabled(!busy);
-    for (QWidget* w :
-         {static_cast<QWidget*>(c_.Cmd_GetCFG), static_cast<QWidget*>(c_.Cmd_GetFileList),
-          static_cast<QWidget*>(c_.Cmd_Admin), static_cast<QWidget*>(c_.Cmd_ClearFiles),
-          static_cast<QWidget*>(c_.Chk_GotFileList), static_cast<QWidget*>(c_.Frame_WebDetails),
-          static_cast<QWidget*>(c_.Chk_GotPHP)})
-        w->setVisible(support);
+    SetEnabled({c_.Cmd_LocateFile, c_.Chk_Active, c_.Chk_Zip, c_.Txt_Name, c_.Txt_FileName,
+                c_.Frame_AdminLocationID, c_.Frame_UserLocationID, c_.Frame_MethodID,
+                c_.Frame_Download, c_.Frame_Upload, c_.Txt_FileDate, c_.Txt_FileDateLocal,
+                c_.Txt_Folder, c_.Cmb_TypeID},
+               s.recordFields);
+    c_.Lst_Files->setEnabled(s.fileList);
+    for (int i = 0; i < 4; ++i) {
+        c_.mnu_File[i]->setVisible(s.fileMenu);
+        c_.mnu_File[i]->setEnabled(s.fileMenuEnabled);
+    }
+    ConfigureRecentFiles();
+    for (int i = 1; i <= RecentFiles::kEntries; ++i)
+        c_.mnu_RecentFile[i]->setEnabled(s.fileMenuEnabled);
+    c_.Cmd_GetFileList->setEnabled(s.getFileList);
+    c_.Cmd_ClearFiles->setEnabled(s.clearFiles);
+    c_.Cmd_DoFile[kFileNew]->setEnabled(s.newEntry);
+    c_.Cmd_DoFile[kFileMoveUp]->setEnabled(s.moveUp);
+    c_.Cmd_DoFile[kFileMoveDown]->setEnabled(s.moveDown);
+    c_.Cmd_DoFile[kFileDelete]->setEnabled(s.deleteEntry);
+    c_.Cmd_DoFile[kFileSave]->setEnabled(s.saveRecord);
+    c_.Cmd_DoFile[kFileSave]->setVisible(s.saveVisible);
+    SetEnabled({c_.Cmd_LocateFolder[1], c_.Txt_LocalFolder[1], c_.Txt_UserFolder,
+                c_.Txt_UserCurrentFolder},
+               s.userFolders);
+    c_.Cmd_Process[RunEngine::kProcessAll]->setEnabled(s.processAll);
+    c_.Cmd_Process[RunEngine::kProcessFile]->setEnabled(s.processFile);
+    c_.Cmd_Cancel->setEnabled(s.cancel);
+    c_.Cmd_Close->setEnabled(s.close);
+    for (QWidget* w : std::initializer_list<QWidget*>{
+             c_.Cmd_GetCFG, c_.Cmd_GetFileList, c_.Cmd_Admin, c_.Cmd_ClearFiles, c_.Chk_GotFileList,
+             c_.Frame_WebDetails, c_.Chk_GotPHP})
+        w->setVisible(s.supportControls);
 
     const LocationFolders folders = Folders();
     for (int i = 0; i < 4; ++i) {
@@ -62,32 +88,12 @@ void frm_WebDataClient::EnableControls() {
         c_.lbl_UserLocationFolder[i]->setToolTip(c_.lbl_UserLocationFolder[i]->text());
     }
     PlotRouteLines();
-    ConfigureClass();
-    ShowFileStatus(sel);
+    // A run hands the fields to the services itself, before every file.
+    if (!in.busy) ConfigureClass();
 }
 
-void frm_WebDataClient::EnableRecordControls(bool editable, bool busy, int sel, int count,
-                                             bool support) {
-    for (QWidget* w : std::initializer_list<QWidget*>{
-             c_.Cmd_LocateFile, c_.Chk_Active, c_.Chk_Zip, c_.Txt_Name, c_.Txt_FileName,
-             c_.Frame_AdminLocationID, c_.Frame_UserLocationID, c_.Frame_MethodID,
-             c_.Frame_Download, c_.Frame_Upload, c_.Txt_FileDate, c_.Txt_FileDateLocal,
-             c_.Txt_Folder})
-        w->setEnabled(editable);
-    for (int i = 0; i < 4; ++i)
-        c_.mnu_File[i]->setVisible(editable);
-    ConfigureRecentFiles();
-    c_.Cmd_GetFileList->setEnabled(!editable);
-    c_.Cmd_DoFile[0]->setEnabled(sel >= 0 && editable && !busy);
-    c_.Cmd_DoFile[1]->setEnabled(sel > 0 && editable && !busy);
-    c_.Cmd_DoFile[2]->setEnabled(sel >= 0 && editable && sel < count - 1 && !busy);
-    c_.Cmd_DoFile[3]->setEnabled(sel >= 0 && editable && !busy);
-    c_.Cmd_DoFile[4]->setEnabled(editable && flags_.RecordEdited);
-    c_.Cmd_DoFile[4]->setVisible(support);
-}
-
-void frm_WebDataClient::ShowFileStatus(int sel) {
-    if (sel < 0) {
+void frm_WebDataClient::RefreshFileStatus() {
+    if (c_.Lst_Files->currentRow() < 0) {
         for (int i = 0; i < 2; ++i) {
             c_.Lbl_FullFilename[i]->clear();
             SetFileStatus(c_.Lbl_FileStatus[i], QString(), false);
@@ -95,10 +101,18 @@ void frm_WebDataClient::ShowFileStatus(int sel) {
         }
         return;
     }
+    // During a run the files are the run's: their dates are read by the
+    // exchange itself and the service is busy with it. Both are looked at
+    // again when the run ends.
+    const bool running = engine_->IsBusy();
     for (int i = 0; i < 2; ++i) {
         const LocationPath full = FullFilename(i);
         c_.Lbl_FullFilename[i]->setText(full.ok() ? full.path : full.refusal);
         c_.Lbl_FullFilename[i]->setToolTip(c_.Lbl_FullFilename[i]->text());
+        if (running) {
+            c_.Lbl_LastDate[i]->clear();
+            continue;
+        }
         c_.Lbl_LastDate[i]->setText(
             full.ok()
                 ? services_->LastDateInFile(full.path, c_.Opt_UserLocationID->SelectedIndex(), i,
@@ -106,7 +120,10 @@ void frm_WebDataClient::ShowFileStatus(int sel) {
                 : QString());
     }
     ShowLocalStatus(FullFilename(kOnThisPc));
-    ShowRemoteStatus(FullFilename(kAtService));
+    if (!running)
+        ShowRemoteStatus(FullFilename(kAtService));
+    else
+        SetFileStatus(c_.Lbl_FileStatus[1], QString(), false);
 }
 
 void frm_WebDataClient::ShowLocalStatus(const LocationPath& full) {
@@ -137,7 +154,7 @@ void frm_WebDataClient::ShowRemoteStatus(const LocationPath& full) {
 void frm_WebDataClient::SetChanged() {
     flags_.RecordEdited = true;
     files_.ListChanged = true;
-    c_.Cmd_DoFile[4]->setEnabled(true);
+    c_.Cmd_DoFile[kFileSave]->setEnabled(true);
 }
 
 void frm_WebDataClient::AddTrace(const QString& text) {
@@ -152,7 +169,13 @@ void frm_WebDataClient::AddTrace(const QString& text) {
 
 void frm_WebDataClient::ShowStatus(const QString& text) {
     AddTrace(QStringLiteral("Status>") + text);
-    SetStatusLabel(c_.Lbl_status, text);
+    if (engine_->IsBusy() && !text.isEmpty() && !c_.Lbl_status->text().isEmpty()) {
+        // During a run the exchanges report several texts a file: the label
+        // keeps its colour and is drawn at the window's pace.
+        c_.Lbl_status->setText(text);
+    } else {
+        SetStatusLabel(c_.Lbl_status, text);
+    }
     if (isMinimized()) setWindowTitle(text);
 }
 
