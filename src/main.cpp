@@ -4,11 +4,17 @@
 #include "app/ui/no_display.h"
 #include "app/ui/window_ports.h"
 #include "support/cipher.h"
+#include "support/ini_store.h"
+#include "support/log_file.h"
 #include "support/program_home.h"
+#include "support/secret_store.h"
+#include "support/tls_trust.h"
 
 #include <QApplication>
 #include <QStringList>
 #include <QTextStream>
+
+#include <chrono>
 
 namespace {
 
@@ -18,10 +24,14 @@ constexpr const char* kLoginKey = "tlu";
 void PrintUsage(QTextStream& out) {
     out << "Quorvel " << QUORVEL_VERSION << "\n"
         << "Keeps data-logger files in step with your account on the web service.\n\n"
-        << "Usage: quorvel [/S] [--home DIR] [--encipher TEXT] [--version] [--help]\n"
+        << "Usage: quorvel [/S] [--home DIR] [--ca-file FILE] [--encipher TEXT] [--version] "
+           "[--help]\n"
         << "  /S               start minimised and work on the schedule\n"
         << "  --home DIR       keep settings, logs and the file list in DIR\n"
         << "                   (also QUORVEL_HOME)\n"
+        << "  --ca-file FILE   also trust the certificate authorities in FILE (PEM) for\n"
+        << "                   https and FTP over TLS, as for a private service; the\n"
+        << "                   setting CAFile does the same\n"
         << "  --encipher TEXT  print TEXT enciphered for line 3 of a configuration file\n";
 }
 
@@ -52,6 +62,37 @@ int AnswerSwitches(const QStringList& args) {
     return -1;
 }
 
+// "--ca-file FILE" (removed from args); a file that cannot serve ends the
+// start, since every secure connection would fail. 2 for such a failure, -1
+// to go on.
+int TakeCaFile(QStringList& args) {
+    const auto at = args.indexOf("--ca-file");
+    if (at < 0) return -1;
+    if (at + 1 >= args.size()) {
+        QTextStream(stderr) << "--ca-file needs the file of the certificate authority\n";
+        return 2;
+    }
+    const QString file = args.at(at + 1);
+    args.remove(at, 2);
+    if (const QString why = quorvel::TlsTrust::CheckCaFile(file); !why.isEmpty()) {
+        QTextStream(stderr) << "--ca-file: " << why << "\n";
+        return 2;
+    }
+    quorvel::TlsTrust::AddExtraCaFile(file);
+    return -1;
+}
+
+// The CA of the settings is taken even when it cannot be read: the secure
+// connections then fail naming the file, rather than go on without it.
+void TakeCaSetting() {
+    const quorvel::LocalSettings settings(quorvel::ProgramHome::SettingsFile());
+    const QString file = settings.GetLocalSetting(QStringLiteral("CAFile"), QString());
+    if (file.isEmpty()) return;
+    if (const QString why = quorvel::TlsTrust::CheckCaFile(file); !why.isEmpty())
+        quorvel::WriteLogFile(QStringLiteral("CAFile: ") + why);
+    quorvel::TlsTrust::AddExtraCaFile(file);
+}
+
 } // namespace
 
 int main(int argc, char* argv[]) {
@@ -60,12 +101,19 @@ int main(int argc, char* argv[]) {
     for (int i = 1; i < argc; ++i)
         given << QString::fromLocal8Bit(argv[i]);
     if (const int code = AnswerSwitches(given); code >= 0) return code;
+    if (const int code = TakeCaFile(given); code >= 0) return code;
 
     if (quorvel::ReportMissingDisplay(argc, argv)) return 2;
     QApplication app(argc, argv);
     QStringList args = app.arguments();
     args.removeFirst();
     quorvel::ProgramHome::Configure(args);
+    if (const auto at = args.indexOf("--ca-file"); at >= 0) args.remove(at, 2);
+    TakeCaSetting();
+    // A locked keyring may ask the user to open it; past this the password
+    // stays in the owner-only settings file instead of blocking the start.
+    const auto secrets = quorvel::MakeDesktopSecretStore(std::chrono::seconds(30));
+    quorvel::SetProcessSecretStore(secrets.get());
 
     quorvel::frm_WebDataClient window(args);
     quorvel::WindowPorts ports(&window);
