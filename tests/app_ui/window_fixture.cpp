@@ -66,6 +66,9 @@ frm_WebDataClient& WindowTest::Start(const QStringList& arguments) {
         unsavedAnswers.erase(unsavedAnswers.begin());
         return answer;
     };
+    dialogs.about = [this](QWidget*, const QString& title, const QString& text) {
+        infoShown << title + "|" + text;
+    };
     window->SetFileDialogs(dialogs);
     window->Form_Load();
     window->show();

@@ -68,6 +68,7 @@ protected:
     int dialogsShown = 0;
     std::vector<int> unsavedAnswers;
     QStringList unsavedAsked; // the list names the questions named
+    QStringList infoShown;    // "title|text" of each informing box
 };
 
 } // namespace quorvel::testing

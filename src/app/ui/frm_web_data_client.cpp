@@ -50,6 +50,9 @@ FileDialogs FileDialogs::System() {
         box.setDefaultButton(QMessageBox::Save);
         return box.exec();
     };
+    dialogs.about = [](QWidget* owner, const QString& title, const QString& text) {
+        QMessageBox::about(owner, title, text);
+    };
     return dialogs;
 }
 

@@ -65,6 +65,8 @@ struct FileDialogs {
     // The list has changes that are not saved: QMessageBox::Save, Discard or
     // Cancel. listName is the list's file name, empty for a new list.
     std::function<int(QWidget*, const QString& listName)> saveChanges;
+    // A box that only informs (About).
+    std::function<void(QWidget*, const QString& title, const QString& text)> about;
     static FileDialogs System();
 };
 
@@ -137,6 +139,9 @@ public:
     void AddToRecentFiles(const QString& fileName);
     void mnu_File_Click(int index);
     void mnu_RecentFile_Click(int index);
+    void mnu_About_Click();
+    // The version and where the program keeps its files.
+    static QString AboutText();
 
     // The folder fields as the location rules take them.
     LocationFolders Folders() const;

@@ -149,27 +149,37 @@ QWidget* BuildTraceArea(WindowControls& c, QWidget* parent) {
 void BuildMenus(QMainWindow* window, WindowControls& c) {
     auto* file = window->menuBar()->addMenu(QStringLiteral("&File"));
     file->setObjectName(QStringLiteral("mnu_FileMenu"));
-    const char* captions[] = {"&New...", "&Open...", "&Save...", "-", "E&xit"};
+    const char* captions[] = {"&New...", "&Open...", "Save &As...", "-", "E&xit"};
+    const QKeySequence keys[] = {QKeySequence::New, QKeySequence::Open, QKeySequence::SaveAs,
+                                 QKeySequence(), QKeySequence::Quit};
     for (int i = 0; i < 5; ++i) {
         // The separator is drawn as a line; its "-" caption would show beside it.
         auto* action = new QAction(i == 3 ? QString() : QLatin1String(captions[i]), window);
         action->setSeparator(i == 3);
         action->setObjectName(Indexed("mnu_File", i));
-        file->addAction(action);
+        action->setShortcut(keys[i]);
         c.mnu_File[i] = action;
     }
+    c.mnu_SaveList = new QAction(QStringLiteral("&Save"), window);
+    c.mnu_SaveList->setObjectName(QStringLiteral("mnu_SaveList"));
+    c.mnu_SaveList->setShortcut(QKeySequence::Save);
+    file->addActions({c.mnu_File[0], c.mnu_File[1], c.mnu_SaveList, c.mnu_File[2], c.mnu_File[3],
+                      c.mnu_File[4]});
     for (int i = 0; i < 6; ++i) {
         auto* action = new QAction(i == 0 ? QString() : QString::number(i), window);
         action->setSeparator(i == 0);
         action->setObjectName(Indexed("mnu_RecentFile", i));
         action->setVisible(false);
-        file->addAction(action);
+        // Above Exit, as file managers and editors place them.
+        file->insertAction(c.mnu_File[3], action);
         c.mnu_RecentFile[i] = action;
     }
     auto* help = window->menuBar()->addMenu(QStringLiteral("&Help"));
     help->setObjectName(QStringLiteral("mnu_HelpMenu"));
     c.mnu_Help[0] = help->addAction(QStringLiteral("&Contents"));
     c.mnu_Help[0]->setObjectName(Indexed("mnu_Help", 0));
+    c.mnu_Help[1] = help->addAction(QStringLiteral("&About Quorvel"));
+    c.mnu_Help[1]->setObjectName(Indexed("mnu_Help", 1));
 }
 
 } // namespace

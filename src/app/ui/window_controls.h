@@ -121,9 +121,10 @@ struct WindowControls {
     CProgress* Pic_ProgressFTP = nullptr;
 
     // Menus
-    std::array<QAction*, 5> mnu_File{};
+    std::array<QAction*, 5> mnu_File{};       // New, Open, Save As, separator, Exit
+    QAction* mnu_SaveList = nullptr;          // Save: the list to its own file
     std::array<QAction*, 6> mnu_RecentFile{}; // 0 is the separator above the entries
-    std::array<QAction*, 1> mnu_Help{};
+    std::array<QAction*, 2> mnu_Help{};       // Contents, About
 };
 
 // Creates every control inside window (central widget and menu bar).

@@ -7,6 +7,7 @@
 #include "support/shell_open.h"
 
 #include <QRadioButton>
+#include <QShortcut>
 
 namespace quorvel {
 
@@ -37,6 +38,12 @@ void frm_WebDataClient::ConnectWindowHandlers() {
     for (int which : {RunEngine::kProcessAll, RunEngine::kProcessFile})
         connect(c_.Cmd_Process[which], &QPushButton::clicked, this,
                 [this, which] { Process(which); });
+    // The Delete key on the list does what the "Delete" button does, when it may.
+    auto* remove =
+        new QShortcut(QKeySequence::Delete, c_.Lst_Files, nullptr, nullptr, Qt::WidgetShortcut);
+    connect(remove, &QShortcut::activated, this, [this] {
+        if (c_.Cmd_DoFile[kFileDelete]->isEnabled()) DoFile(kFileDelete);
+    });
 }
 
 QStringList frm_WebDataClient::StartupArguments() {

@@ -1,6 +1,7 @@
 // The File menu with its recent file lists, and the Help menu.
 
 #include "app/ui/frm_web_data_client.h"
+#include "support/program_home.h"
 
 #include <QDir>
 
@@ -24,8 +25,22 @@ void frm_WebDataClient::ConnectMenus() {
     for (int i = 1; i <= RecentFiles::kEntries; ++i)
         connect(c_.mnu_RecentFile[i], &QAction::triggered, this,
                 [this, i] { mnu_RecentFile_Click(i); });
+    connect(c_.mnu_SaveList, &QAction::triggered, this, [this] { SaveListNow(); });
     // "&Contents" has no help file to open yet.
     c_.mnu_Help[0]->setEnabled(false);
+    connect(c_.mnu_Help[1], &QAction::triggered, this, [this] { mnu_About_Click(); });
+}
+
+QString frm_WebDataClient::AboutText() {
+    return QStringLiteral("<p><b>Quorvel %1</b></p>"
+                          "<p>Keeps the files of your data loggers and weather stations in step "
+                          "with your account on the web service.</p>"
+                          "<p>Settings, logs and the file list: %2</p>")
+        .arg(QStringLiteral(QUORVEL_VERSION), ProgramHome::Folder().toHtmlEscaped());
+}
+
+void frm_WebDataClient::mnu_About_Click() {
+    dialogs_.about(this, QStringLiteral("About Quorvel"), AboutText());
 }
 
 void frm_WebDataClient::ConfigureRecentFiles() {

@@ -57,9 +57,10 @@ void frm_WebDataClient::EnableControls() {
                 c_.Txt_Folder, c_.Cmb_TypeID},
                s.recordFields);
     c_.Lst_Files->setEnabled(s.fileList);
-    for (int i = 0; i < 4; ++i) {
-        c_.mnu_File[i]->setVisible(s.fileMenu);
-        c_.mnu_File[i]->setEnabled(s.fileMenuEnabled);
+    for (QAction* entry :
+         {c_.mnu_File[0], c_.mnu_File[1], c_.mnu_File[2], c_.mnu_File[3], c_.mnu_SaveList}) {
+        entry->setVisible(s.fileMenu);
+        entry->setEnabled(s.fileMenuEnabled);
     }
     ConfigureRecentFiles();
     for (int i = 1; i <= RecentFiles::kEntries; ++i)
