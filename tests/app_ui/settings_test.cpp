@@ -10,6 +10,7 @@
 #include <QDir>
 #include <QFile>
 #include <QMessageBox>
+#include <QRegularExpression>
 #include <QUrl>
 
 #include <array>
@@ -100,28 +101,82 @@ TEST_F(SettingsTest, ScheduledStartIsMinimisedAndDoesNotInitialise) {
     EXPECT_EQ(window->windowTitle(), "Due in 02:00");
 }
 
-TEST_F(SettingsTest, UnreadableOptionIndexEndsTheLoadWithAReport) {
+// One unreadable value falls back to its own default: the start goes on and
+// the exit writes every other setting as it was stored.
+TEST_F(SettingsTest, AnUnreadableOptionFallsBackAloneAndTheOthersSurviveTheExit) {
+    const QStringList keys = {"GetFileList", "Automatic",  "Interval", "CFG_URL",
+                              "DataFolder",  "Whichdates", "AfterDate"};
+    const QStringList values = {
+        "0", "1", "6 hours", "http://example.test/cfg.txt", home.File("data"), "1", "1 Mar 2021"};
+    for (int i = 0; i < keys.size(); ++i)
+        Setting(keys[i], values[i]);
     Setting("GetLocalFolders", "many");
     Start();
-    ASSERT_FALSE(ports.prompter.shown.empty());
-    EXPECT_TRUE(ports.prompter.shown[0].message.contains("Quorvel:Load"))
+    ASSERT_EQ(ports.prompter.shown.size(), 1u);
+    EXPECT_TRUE(ports.prompter.shown[0].message.contains("GetLocalFolders=many"))
         << ports.prompter.shown[0].message.toStdString();
-    // The window is not left locked.
     EXPECT_FALSE(window->Flags().IsLoading);
+    EXPECT_EQ(C().Opt_GetLocalFolders->CheckedIndex(), 1);
+    EXPECT_EQ(C().Cmb_interval->currentText(), "6 hours");
+    Close();
+    for (int i = 0; i < keys.size(); ++i)
+        EXPECT_EQ(Stored(keys[i]), values[i]) << keys[i].toStdString();
+    EXPECT_EQ(Stored("GetLocalFolders"), "1");
 }
 
-TEST_F(SettingsTest, RunAtStartUpWritesAndRemovesTheAutostartEntry) {
-    Start();
-    EXPECT_FALSE(C().Chk_RunAtStartUp->isChecked());
-    C().Chk_RunAtStartUp->click();
-    ASSERT_TRUE(QFile::exists(AutostartEntry()));
-    EXPECT_TRUE(home.Read("autostart/" + ProgramHome::ProgramName() + ".desktop").contains("/S"));
-    Close();
+// Started at log-on, the program must find the settings and the list it has
+// now: a home other than the default one goes into the entry, quoted.
+TEST_F(SettingsTest, TheAutostartEntryCarriesAHomeThatIsNotTheDefault) {
+    struct Case {
+        QString home; // empty: the default folder
+        QString arguments;
+    };
+    const QString spaced = home.File("my data");
+    const Case cases[] = {{spaced, "/S --home \"" + spaced + "\""},
+                          {home.File("plain"), "/S --home " + home.File("plain")},
+                          {QString(), "/S"}};
+    for (const Case& c : cases) {
+        ProgramHome::SetFolder(c.home);
+        ASSERT_EQ(ProgramHome::IsDefault(), c.home.isEmpty());
+        Start();
+        C().Chk_RunAtStartUp->click();
+        const QStringList lines =
+            QString::fromUtf8(home.Read("autostart/" + ProgramHome::ProgramName() + ".desktop"))
+                .split('\n');
+        const QStringList exec = lines.filter(QRegularExpression("^Exec="));
+        ASSERT_EQ(exec.size(), 1) << c.arguments.toStdString();
+        EXPECT_TRUE(exec[0].endsWith(" " + c.arguments)) << exec[0].toStdString();
+        // The box reads the entry back as ticked.
+        Close();
+        Start();
+        EXPECT_TRUE(C().Chk_RunAtStartUp->isChecked());
+        C().Chk_RunAtStartUp->click();
+        Close();
+    }
+    ProgramHome::SetFolder(home.Path());
+}
 
+// The recent lists are written at exit with the other settings.
+TEST_F(SettingsTest, TheRecentListsSurviveARestart) {
+    UserMaintainsList();
+    WriteList({Line("A", "a.csv")});
+    WriteList({Line("B", "b.csv")}, "lists/b.txt");
+    WriteList({Line("C", "c.csv")}, "lists/c.txt");
     Start();
-    EXPECT_TRUE(C().Chk_RunAtStartUp->isChecked());
-    C().Chk_RunAtStartUp->click();
-    EXPECT_FALSE(QFile::exists(AutostartEntry()));
+    for (const char* name : {"lists/b.txt", "lists/c.txt"}) {
+        AnswerDialogs({home.File(name)});
+        C().mnu_File[1]->trigger();
+    }
+    const QStringList shown = {home.File("lists/c.txt"), home.File("lists/b.txt"),
+                               home.File("files.txt")};
+    Close();
+    Start();
+    QStringList recent;
+    for (int i = 1; i <= 5 && !window->Recent().Entry(i).isEmpty(); ++i)
+        recent << window->Recent().Entry(i);
+    EXPECT_EQ(recent, shown);
+    // The newest is the list the start opens.
+    EXPECT_EQ(ListNames(), QStringList({"C"}));
 }
 
 TEST_F(SettingsTest, AListOnlyLoadedIsNotWrittenBackAtExit) {
