@@ -185,6 +185,7 @@ private:
     void InstallDropTargets();
 
     // Lifecycle details.
+    QSize FirstSize() const;
     bool AccountSteps(bool& listFromService);
     void ApplySettings(const AppSettings& values);
     AppSettings CurrentSettings() const;

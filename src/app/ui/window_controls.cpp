@@ -6,6 +6,8 @@
 #include <QHBoxLayout>
 #include <QMainWindow>
 #include <QMenuBar>
+#include <QScrollArea>
+#include <QSplitter>
 #include <QStyle>
 #include <QVBoxLayout>
 
@@ -121,28 +123,42 @@ QLayout* BuildRunRow(WindowControls& c, QWidget* parent) {
 
 QWidget* BuildTraceArea(WindowControls& c, QWidget* parent) {
     auto* area = new QWidget(parent);
-    auto* layout = new QHBoxLayout(area);
+    auto* layout = new QVBoxLayout(area);
     layout->setContentsMargins(0, 0, 0, 0);
-    auto* switches = new QVBoxLayout;
+    // The switches stand in one row above the pane, so the pane keeps the
+    // window's whole width and a short window still shows some trace.
+    auto* switches = new QHBoxLayout;
     c.Chk_Trace = MakeCheck(QStringLiteral("Chk_Trace"), QStringLiteral("Trace"), area);
     c.chk_TraceServer =
         MakeCheck(QStringLiteral("chk_TraceServer"), QStringLiteral("TraceServer"), area);
     switches->addWidget(c.Chk_Trace);
     switches->addWidget(c.chk_TraceServer);
+    switches->addSpacing(12);
     const char* logs[] = {"Status", "Send", "Receive", "Decisions", "Receive detail"};
     for (int i = 0; i < 5; ++i) {
         c.chk_Log[i] = MakeCheck(Indexed("chk_Log", i), QLatin1String(logs[i]), area);
         switches->addWidget(c.chk_Log[i]);
     }
+    switches->addStretch(1);
     c.Cmd_Clear = MakeButton(QStringLiteral("Cmd_Clear"), QStringLiteral("Clear"), area);
     switches->addWidget(c.Cmd_Clear);
-    switches->addStretch(1);
     layout->addLayout(switches);
     c.Lst_Trace = new QListWidget(area);
     c.Lst_Trace->setObjectName(QStringLiteral("Lst_Trace"));
     // The trace pane takes whatever room the window has left, but never less than this.
-    c.Lst_Trace->setMinimumSize(67, 67);
+    c.Lst_Trace->setMinimumSize(67, 48);
     layout->addWidget(c.Lst_Trace, 1);
+    return area;
+}
+
+// A page of the tab strip that scrolls rather than force its size on the
+// window: a small screen still gets the whole window.
+QScrollArea* Scrolled(QWidget* page) {
+    auto* area = new QScrollArea;
+    area->setObjectName(page->objectName() + QStringLiteral("Scroll"));
+    area->setFrameShape(QFrame::NoFrame);
+    area->setWidgetResizable(true);
+    area->setWidget(page);
     return area;
 }
 
@@ -191,26 +207,38 @@ void BuildWindowControls(QMainWindow* window, WindowControls& c) {
     c.Pic_ProgressFile = new CProgress(central);
     c.Pic_ProgressFTP = new CProgress(central);
 
-    auto* top = new QHBoxLayout;
-    c.SSTab1 = new QTabWidget(central);
+    // The editor with the list beside it above, the runs and the trace below;
+    // the user moves the line between them, and both grow with the window.
+    c.Spl_Window = new QSplitter(Qt::Vertical, central);
+    c.Spl_Window->setObjectName(QStringLiteral("Spl_Window"));
+    c.Spl_Window->setChildrenCollapsible(false);
+    auto* upper = new QWidget(c.Spl_Window);
+    auto* top = new QHBoxLayout(upper);
+    top->setContentsMargins(0, 0, 0, 0);
+    c.SSTab1 = new QTabWidget(upper);
     c.SSTab1->setObjectName(QStringLiteral("SSTab1"));
-    c.SSTab1->addTab(BuildMainTab(c), QStringLiteral("Main"));
-    c.SSTab1->addTab(BuildFilesTab(c), QStringLiteral("Files"));
-    c.SSTab1->addTab(BuildFoldersTab(c), QStringLiteral("Folders"));
-    c.SSTab1->addTab(BuildNewSeasonTab(c), QStringLiteral("New Season"));
-    c.SSTab1->addTab(BuildOptionsTab(c), QStringLiteral("Options"));
+    c.SSTab1->addTab(Scrolled(BuildMainTab(c)), QStringLiteral("Main"));
+    c.SSTab1->addTab(Scrolled(BuildFilesTab(c)), QStringLiteral("Files"));
+    c.SSTab1->addTab(Scrolled(BuildFoldersTab(c)), QStringLiteral("Folders"));
+    c.SSTab1->addTab(Scrolled(BuildNewSeasonTab(c)), QStringLiteral("New Season"));
+    c.SSTab1->addTab(Scrolled(BuildOptionsTab(c)), QStringLiteral("Options"));
     top->addWidget(c.SSTab1, 1);
-    top->addWidget(BuildFileListColumn(c, central));
-    root->addLayout(top, 0);
+    top->addWidget(BuildFileListColumn(c, upper));
 
-    root->addLayout(BuildRunRow(c, central));
-    c.Lbl_status = MakePathLabel(QStringLiteral("Lbl_status"), central);
+    auto* lower = new QWidget(c.Spl_Window);
+    auto* bottom = new QVBoxLayout(lower);
+    bottom->setContentsMargins(0, 0, 0, 0);
+    bottom->addLayout(BuildRunRow(c, lower));
+    c.Lbl_status = MakePathLabel(QStringLiteral("Lbl_status"), lower);
     c.Lbl_status->setAutoFillBackground(true);
     c.Lbl_status->setFrameShape(QFrame::Panel);
     c.Lbl_status->setFrameShadow(QFrame::Sunken);
     c.Lbl_status->setMinimumHeight(22);
-    root->addWidget(c.Lbl_status);
-    root->addWidget(BuildTraceArea(c, central), 1);
+    bottom->addWidget(c.Lbl_status);
+    bottom->addWidget(BuildTraceArea(c, lower), 1);
+    c.Spl_Window->setStretchFactor(0, 3);
+    c.Spl_Window->setStretchFactor(1, 2);
+    root->addWidget(c.Spl_Window, 1);
 
     window->setCentralWidget(central);
     BuildMenus(window, c);

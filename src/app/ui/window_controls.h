@@ -18,6 +18,7 @@
 #include <array>
 
 class QMainWindow;
+class QSplitter;
 
 namespace quorvel {
 
@@ -25,6 +26,7 @@ class CProgress;
 class RouteView;
 
 struct WindowControls {
+    QSplitter* Spl_Window = nullptr; // the editor and list above, runs and trace below
     QTabWidget* SSTab1 = nullptr;
 
     // "Main"
