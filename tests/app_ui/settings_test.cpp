@@ -9,6 +9,7 @@
 #include <QDate>
 #include <QDir>
 #include <QFile>
+#include <QImage>
 #include <QMessageBox>
 #include <QRegularExpression>
 #include <QUrl>
@@ -38,6 +39,32 @@ TEST_F(SettingsTest, FirstStartWithoutSettingsUsesTheDefaults) {
     EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("files.txt"));
     EXPECT_EQ(window->windowTitle(), "TALU Quorvel");
     EXPECT_FALSE(window->StartedMinimised());
+}
+
+// A first start is no dead end: the empty list says what to do next, and
+// what it says follows who keeps the list.
+TEST_F(SettingsTest, AFirstStartSaysWhatToDoNext) {
+    Start();
+    // Drawn pixels in the middle band of the list, where the hint stands and
+    // where the first entries do not reach.
+    const auto hintPixels = [&] {
+        const QImage image = C().Lst_Files->viewport()->grab().toImage();
+        const QColor back = C().Lst_Files->palette().color(QPalette::Base);
+        int count = 0;
+        for (int y = image.height() / 3; y < image.height() * 2 / 3; ++y)
+            for (int x = 0; x < image.width(); ++x)
+                count += QColor(image.pixel(x, y)) != back ? 1 : 0;
+        return count;
+    };
+    EXPECT_TRUE(C().Lst_Files->EmptyHint().contains("Log in on the Main tab"));
+    EXPECT_GT(hintPixels(), 0);
+    C().Opt_GetFileList->Button(0)->click();
+    EXPECT_TRUE(C().Lst_Files->EmptyHint().contains("Press New"));
+    ASSERT_TRUE(C().Cmd_DoFile[kFileNew]->isEnabled());
+    AnswerDialogs({home.File("first.csv")});
+    C().Cmd_DoFile[kFileNew]->click();
+    EXPECT_EQ(ListNames(), QStringList({"first.csv"}));
+    EXPECT_EQ(hintPixels(), 0);
 }
 
 TEST_F(SettingsTest, FirstActivationLoadsTheListOfTheFirstRecentEntry) {

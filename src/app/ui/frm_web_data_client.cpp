@@ -13,7 +13,6 @@
 #include <QGuiApplication>
 #include <QMessageBox>
 #include <QRadioButton>
-#include <QScreen>
 
 namespace quorvel {
 
@@ -74,15 +73,8 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     run_ = std::make_unique<WindowRun>(*this);
     ConnectHandlers();
     InstallDropTargets();
+    setMinimumSize(760, 540); // below this the editor has no room left to work in
     resize(FirstSize());
-}
-
-QSize frm_WebDataClient::FirstSize() const {
-    // Roomy where the screen allows, never beyond its free area (less the
-    // title bar the desktop adds), never below what the controls need.
-    const QSize roomy(1040, 660);
-    const QSize room = screen()->availableGeometry().size() - QSize(0, 40);
-    return roomy.boundedTo(room).expandedTo(minimumSizeHint());
 }
 
 frm_WebDataClient::~frm_WebDataClient() = default;

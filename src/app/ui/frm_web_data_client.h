@@ -185,7 +185,9 @@ private:
     void InstallDropTargets();
 
     // Lifecycle details.
+    // The size the window opens with, and the first share of its splitters.
     QSize FirstSize() const;
+    void FirstSplit();
     bool AccountSteps(bool& listFromService);
     void ApplySettings(const AppSettings& values);
     AppSettings CurrentSettings() const;
@@ -244,6 +246,7 @@ private:
     bool refreshAgain_ = false;
     std::optional<int> processAfterRefresh_;
     bool activated_ = false;
+    bool split_ = false; // the splitters got their first share
     bool reactivate_ = false;
     LocalSettings settings_;
     FileDialogs dialogs_;

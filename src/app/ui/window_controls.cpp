@@ -1,5 +1,6 @@
 #include "app/ui/window_controls.h"
 
+#include "support/ui/hint_list.h"
 #include "support/ui/progress_bar.h"
 
 #include <QGridLayout>
@@ -79,9 +80,9 @@ QWidget* BuildFileListColumn(WindowControls& c, QWidget* parent) {
     auto* layout = new QVBoxLayout(column);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->addWidget(MakeLabel(QStringLiteral("Files"), column));
-    c.Lst_Files = new QListWidget(column);
+    c.Lst_Files = new HintList(column);
     c.Lst_Files->setObjectName(QStringLiteral("Lst_Files"));
-    c.Lst_Files->setMinimumWidth(210);
+    c.Lst_Files->setMinimumWidth(170);
     // One line of text each: the view need not measure every entry to place one.
     c.Lst_Files->setUniformItemSizes(true);
     layout->addWidget(c.Lst_Files, 1);
@@ -212,9 +213,10 @@ void BuildWindowControls(QMainWindow* window, WindowControls& c) {
     c.Spl_Window = new QSplitter(Qt::Vertical, central);
     c.Spl_Window->setObjectName(QStringLiteral("Spl_Window"));
     c.Spl_Window->setChildrenCollapsible(false);
-    auto* upper = new QWidget(c.Spl_Window);
-    auto* top = new QHBoxLayout(upper);
-    top->setContentsMargins(0, 0, 0, 0);
+    // The list beside the editor may be widened at the editor's cost.
+    auto* upper = new QSplitter(Qt::Horizontal, c.Spl_Window);
+    upper->setObjectName(QStringLiteral("Spl_Editor"));
+    upper->setChildrenCollapsible(false);
     c.SSTab1 = new QTabWidget(upper);
     c.SSTab1->setObjectName(QStringLiteral("SSTab1"));
     c.SSTab1->addTab(Scrolled(BuildMainTab(c)), QStringLiteral("Main"));
@@ -222,8 +224,10 @@ void BuildWindowControls(QMainWindow* window, WindowControls& c) {
     c.SSTab1->addTab(Scrolled(BuildFoldersTab(c)), QStringLiteral("Folders"));
     c.SSTab1->addTab(Scrolled(BuildNewSeasonTab(c)), QStringLiteral("New Season"));
     c.SSTab1->addTab(Scrolled(BuildOptionsTab(c)), QStringLiteral("Options"));
-    top->addWidget(c.SSTab1, 1);
-    top->addWidget(BuildFileListColumn(c, upper));
+    upper->addWidget(c.SSTab1);
+    upper->addWidget(BuildFileListColumn(c, upper));
+    upper->setStretchFactor(0, 1);
+    upper->setStretchFactor(1, 0);
 
     auto* lower = new QWidget(c.Spl_Window);
     auto* bottom = new QVBoxLayout(lower);

@@ -3,6 +3,7 @@
 // them once (BuildWindowControls) and its procedures reach them through here.
 
 #include "app/ui/option_buttons.h"
+#include "support/ui/hint_list.h"
 
 #include <QAction>
 #include <QCheckBox>
@@ -108,7 +109,7 @@ struct WindowControls {
     QPushButton* Cmd_GetCFG = nullptr;
 
     // Outside the tab strip
-    QListWidget* Lst_Files = nullptr;
+    HintList* Lst_Files = nullptr;            // says what to do while it is empty
     std::array<QPushButton*, 5> Cmd_DoFile{}; // 4 "Save" stands on "New Season"
     std::array<QPushButton*, 2> Cmd_Process{};
     QPushButton* Cmd_Cancel = nullptr;

@@ -19,6 +19,8 @@
 #include <QRadioButton>
 #include <QTimer>
 
+#include <utility>
+
 namespace quorvel {
 
 namespace {
@@ -192,6 +194,7 @@ void frm_WebDataClient::closeEvent(QCloseEvent* event) {
 
 void frm_WebDataClient::showEvent(QShowEvent* event) {
     QMainWindow::showEvent(event);
+    if (!std::exchange(split_, true)) FirstSplit();
     // The first showing counts as the first activation, also where no window
     // manager ever activates the window.
     if (!activated_)

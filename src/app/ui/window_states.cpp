@@ -38,6 +38,16 @@ void SetEnabled(std::initializer_list<QWidget*> widgets, bool enabled) {
         w->setEnabled(enabled);
 }
 
+// What an empty file list tells the user to do next.
+QString EmptyListHint(bool listFromUser) {
+    if (listFromUser)
+        return QStringLiteral("No data files in this list yet.\n\nPress New to choose them, "
+                              "or drag them here from your file manager.");
+    return QStringLiteral("No file list yet.\n\nLog in on the Main tab to get the list kept "
+                          "for you at the web site, or choose \"File list from... User\" on the "
+                          "Files tab to make your own.");
+}
+
 } // namespace
 
 void frm_WebDataClient::EnableControls() {
@@ -57,6 +67,7 @@ void frm_WebDataClient::EnableControls() {
                 c_.Txt_Folder, c_.Cmb_TypeID},
                s.recordFields);
     c_.Lst_Files->setEnabled(s.fileList);
+    c_.Lst_Files->SetEmptyHint(EmptyListHint(in.listFromUser));
     for (QAction* entry :
          {c_.mnu_File[0], c_.mnu_File[1], c_.mnu_File[2], c_.mnu_File[3], c_.mnu_SaveList}) {
         entry->setVisible(s.fileMenu);
