@@ -7,6 +7,7 @@
 #include "support/ui/widget_prompter.h"
 
 #include <QApplication>
+#include <QImage>
 #include <QMessageBox>
 #include <QScreen>
 #include <QTimer>
@@ -82,6 +83,19 @@ TEST_F(WindowLayoutTest, BoxesCarryTheProgramsTitle) {
     readAndClose();
     prompter.MyMsgBox("Disk full", kButtonsOk | kIconExclamation);
     EXPECT_EQ(titles, QStringList({"TALU Quorvel", "TALU Quorvel"}));
+}
+
+// The task bar and the tray show the program's own icon, and the desktop can
+// match the window to the installed entry.
+TEST_F(WindowLayoutTest, TheWindowCarriesTheProgramsIconAndEntryName) {
+    Start();
+    EXPECT_EQ(QGuiApplication::desktopFileName(), "org.quorvel.Quorvel");
+    const QImage icon = window->windowIcon().pixmap(48, 48).toImage();
+    ASSERT_FALSE(icon.isNull());
+    // Drawn, not blank: the tile's blue fills the middle.
+    const QColor middle = icon.pixelColor(24, 12);
+    EXPECT_GT(middle.alpha(), 200);
+    EXPECT_GT(middle.blue(), middle.red());
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "app/app_services.h"
 #include "app/run/run_engine.h"
+#include "app/ui/desktop_identity.h"
 #include "app/ui/route_view.h"
 #include "app/ui/window_displays.h"
 #include "app/ui/window_run.h"
@@ -60,8 +61,8 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     : QMainWindow(parent), scheduledStart_(HasScheduleSwitch(arguments)),
       settings_(ProgramHome::SettingsFile()), dialogs_(FileDialogs::System()) {
     setObjectName(QStringLiteral("frm_WebDataClient"));
-    // Every box and dialog of the program carries its title.
-    QGuiApplication::setApplicationDisplayName(QString::fromLatin1(kApplicationTitle));
+    // Every box and dialog of the program carries its title and icon.
+    ApplyDesktopIdentity(QString::fromLatin1(kApplicationTitle));
     setWindowTitle(QStringLiteral("Quorvel"));
     BuildWindowControls(this, c_);
     for (auto* picture : c_.Pic_Route)
