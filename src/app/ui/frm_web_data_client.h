@@ -28,8 +28,11 @@ class AppServices;
 class CTALUWebData;
 class FtpDisplay;
 class RunEngine;
+class RunLock;
 class WindowRun;
+class WindowScheduler;
 struct AppSettings;
+struct RunSummary;
 struct FileRecord;
 struct TransferRules;
 
@@ -81,8 +84,12 @@ public:
     bool Initialise();
     bool ConfigureClass();
 
-    // Runs: 0 all files, 1 the file shown (RunEngine::Which).
-    void Process(int which);
+    // Runs: 0 all files, 1 the file shown (RunEngine::Which). Nothing runs
+    // while another process on this program home runs (summary.lockHeld).
+    RunSummary Process(int which);
+    // The "Process all" and "Process file" buttons: a run, or the news that
+    // one is under way elsewhere.
+    void Cmd_Process_Click(int which);
 
     // Window states, trace and status. EnableControls derives the states
     // alone; RefreshFileStatus looks at the record's files (the local file,
@@ -137,6 +144,8 @@ public:
     // The web-data object the window owns for the whole run.
     CTALUWebData& WebData();
     RunEngine& Engine() { return *engine_; }
+    // Timer1 and the schedule labels; NextDue() is the next automatic run.
+    WindowScheduler& Scheduler() { return *scheduler_; }
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
@@ -212,8 +221,10 @@ private:
     FileDialogs dialogs_;
     std::unique_ptr<FtpDisplay> ftpDisplay_;
     std::unique_ptr<AppServices> services_;
+    std::unique_ptr<RunLock> runLock_;
     std::unique_ptr<RunEngine> engine_;
     std::unique_ptr<WindowRun> run_;
+    std::unique_ptr<WindowScheduler> scheduler_;
 };
 
 // True when the arguments hold "/S" in any letter case.

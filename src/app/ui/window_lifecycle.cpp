@@ -5,6 +5,7 @@
 #include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
 #include "app/ui/window_displays.h"
+#include "app/ui/window_scheduler.h"
 #include "support/date_value.h"
 #include "support/program_home.h"
 #include "support/run_at_startup.h"
@@ -50,6 +51,7 @@ void SetBackground(QWidget* widget, const QColor& colour) {
 
 void frm_WebDataClient::Form_Load() {
     flags_.IsLoading = true;
+    scheduler_->Start();
     if (scheduledStart_) setWindowState(windowState() | Qt::WindowMinimized);
     services_->SetViews(this, ftpDisplay_.get(), c_.Pic_ProgressFTP);
     ComboBoxSink intervals(c_.Cmb_interval);
