@@ -78,6 +78,7 @@ void frm_WebDataClient::ConnectHandlers() {
     ConnectRecordHandlers();
     ConnectWindowHandlers();
     ConnectMenus();
+    ConnectLoginHandlers();
 }
 
 void frm_WebDataClient::SetLoadedFile(const QString& path) {

@@ -3,6 +3,7 @@
 // the selected file record, the file list, the trace pane and the run buttons.
 // Loading it starts the client and closing it ends it.
 
+#include "app/account_login.h"
 #include "app/app_error.h"
 #include "app/file_list.h"
 #include "app/locations.h"
@@ -83,6 +84,16 @@ public:
     void Form_Activate();
     bool Initialise();
     bool ConfigureClass();
+
+    // Login and account configuration (the steps are AccountLogin's).
+    bool GetSecureFTPDetails();
+    bool GetUserDetails();
+    bool GetFileListFromServer();
+    void Cmd_Login_Click();
+    void Cmd_GetCFG_Click();
+    void Cmd_GetFileList_Click();
+    AccountFields AccountFieldsShown() const;
+    void ShowAccountFields(const AccountFields& fields);
 
     // Runs: 0 all files, 1 the file shown (RunEngine::Which). Nothing runs
     // while another process on this program home runs (summary.lockHeld).
@@ -168,6 +179,7 @@ private:
     void ConnectRecordHandlers();
     void ConnectWindowHandlers();
     void ConnectMenus();
+    void ConnectLoginHandlers();
     void InstallDropTargets();
 
     // Lifecycle details.

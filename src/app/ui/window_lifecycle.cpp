@@ -131,15 +131,6 @@ void frm_WebDataClient::Form_Activate() {
     flags_.InMessage = false;
 }
 
-bool frm_WebDataClient::AccountSteps(bool& listFromService) {
-    // The login steps go here: the configuration file, the user's details from
-    // the service and, when the administrator keeps the file list, the user's
-    // list from the service. Until they exist there is no account to sign in
-    // to, so the list named by the first recent entry is used.
-    listFromService = false;
-    return true;
-}
-
 bool frm_WebDataClient::Initialise() {
     BusyGuard busy(CurrentBusyPointer());
     bool listFromService = false;
