@@ -8,8 +8,11 @@
 #include "app/ui/window_ports.h"
 #include "app/window_instance.h"
 #include "support/cipher.h"
+#include "support/ini_store.h"
 #include "support/log_file.h"
 #include "support/program_home.h"
+#include "support/secret_store.h"
+#include "support/tls_trust.h"
 
 #include <QApplication>
 #include <QCoreApplication>
@@ -17,12 +20,16 @@
 #include <QStringList>
 #include <QTextStream>
 
+#include <chrono>
+
 namespace {
 
 using quorvel::CommandLine;
 
 // A start on a program home whose window is open brings that window forward.
 constexpr std::chrono::milliseconds kShowWait{3000};
+// How long the command-line run waits for the desktop's secret store.
+constexpr std::chrono::milliseconds kUnattendedStoreWait{5000};
 
 // The switches that print something and end; -1 when the program goes on.
 int AnswerSwitches(const CommandLine& line) {
@@ -57,10 +64,38 @@ void ChooseHome(const CommandLine& line) {
     quorvel::ProgramHome::SetFolder(line.home.value_or(qEnvironmentVariable("QUORVEL_HOME")));
 }
 
+// The CA of --ca-file; a file that cannot serve ends the start, since every
+// secure connection would fail. 2 for such a failure, -1 to go on.
+int TakeCaFile(const CommandLine& line) {
+    if (!line.caFile) return -1;
+    if (const QString why = quorvel::TlsTrust::CheckCaFile(*line.caFile); !why.isEmpty()) {
+        QTextStream(stderr) << "--ca-file: " << why << "\n";
+        return 2;
+    }
+    quorvel::TlsTrust::AddExtraCaFile(*line.caFile);
+    return -1;
+}
+
+// The CA of the settings is taken even when it cannot be read: the secure
+// connections then fail naming the file, rather than go on without it.
+void TakeCaSetting() {
+    const quorvel::LocalSettings settings(quorvel::ProgramHome::SettingsFile());
+    const QString file = settings.GetLocalSetting(QStringLiteral("CAFile"), QString());
+    if (file.isEmpty()) return;
+    if (const QString why = quorvel::TlsTrust::CheckCaFile(file); !why.isEmpty())
+        quorvel::WriteLogFile(QStringLiteral("CAFile: ") + why);
+    quorvel::TlsTrust::AddExtraCaFile(file);
+}
+
 // No widget and no display: the core alone, and no box that waits.
 int RunAll(int argc, char* argv[], const CommandLine& line) {
     QCoreApplication app(argc, argv);
     ChooseHome(line);
+    TakeCaSetting();
+    // A keyring that would have to ask for its password counts as absent at
+    // once: nobody is there to answer.
+    const auto secrets = quorvel::MakeDesktopSecretStore(kUnattendedStoreWait);
+    quorvel::SetProcessSecretStore(secrets.get());
     quorvel::UnattendedPrompter prompter;
     quorvel::SystemClock clock;
     quorvel::Ports ports;
@@ -103,12 +138,18 @@ int main(int argc, char* argv[]) {
         given << QString::fromLocal8Bit(argv[i]);
     const CommandLine line = quorvel::ParseCommandLine(given);
     if (const int code = AnswerSwitches(line); code >= 0) return code;
+    if (const int code = TakeCaFile(line); code >= 0) return code;
     if (line.runAll) return RunAll(argc, argv, line);
 
     QApplication app(argc, argv);
     ChooseHome(line);
     quorvel::WindowInstance instance(quorvel::ProgramHome::Folder());
     if (!instance.Claim()) return LeaveToOpenWindow(instance, line.scheduled);
+    TakeCaSetting();
+    // A locked keyring may ask the user to open it; past this the password
+    // stays in the owner-only settings file instead of blocking the start.
+    const auto secrets = quorvel::MakeDesktopSecretStore(std::chrono::seconds(30));
+    quorvel::SetProcessSecretStore(secrets.get());
 
     const QStringList arguments = line.scheduled ? QStringList{QStringLiteral("/S")} : QStringList{};
     quorvel::frm_WebDataClient window(arguments);

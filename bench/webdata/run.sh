@@ -126,3 +126,6 @@ printf 'whole_file_read_last_date_1gb: %.1f ms\n' "$full_ms"
 printf 'tail_n1_1gb: %s ms\n' "$tail_ms"
 printf 'webdata_last_date_1gb_vs_whole_read: %s x\n' "$(ratio "$ours_ms" "$full_ms")"
 printf 'webdata_last_date_1gb_vs_tail: %s x\n' "$(ratio "$ours_ms" "$tail_ms")"
+
+# The same ingest over TLS, against curl over the same https server.
+"$here/tls_run.sh" "$build"

@@ -2,8 +2,8 @@
 
 #include "transfer/ftp.h"
 #include "webdata/display_link.h"
+#include "webdata/service_socket_control.h"
 #include "webdata/talu_web_data.h"
-#include "webdata/tcp_socket_control.h"
 
 namespace quorvel {
 
@@ -50,8 +50,8 @@ private:
 };
 
 AppServices::AppServices()
-    : socket_(std::make_unique<TcpSocketControl>(1)), webData_(std::make_unique<CTALUWebData>()),
-      relay_(std::make_unique<StatusRelay>(status_)),
+    : socket_(std::make_unique<ServiceSocketControl>(1)),
+      webData_(std::make_unique<CTALUWebData>()), relay_(std::make_unique<StatusRelay>(status_)),
       displayLink_(std::make_unique<DisplayLink>(*webData_, *relay_)),
       records_(std::make_unique<WebDataRecords>(*webData_)), files_(std::make_unique<FtpFiles>()) {
     webData_->MyWinsock(socket_.get());

@@ -24,7 +24,7 @@ namespace quorvel {
 
 class CTALUWebData;
 class DisplayLink;
-class TcpSocketControl;
+class ServiceSocketControl;
 
 class AppServices : public RunServices, public AccountService {
 public:
@@ -75,7 +75,7 @@ private:
     TraceView* status_ = nullptr;
     TraceView* ftpTrace_ = nullptr;
     ProgressView* transferProgress_ = nullptr;
-    std::unique_ptr<TcpSocketControl> socket_;
+    std::unique_ptr<ServiceSocketControl> socket_; // plain or TLS by the server text
     std::unique_ptr<CTALUWebData> webData_;
     std::unique_ptr<StatusRelay> relay_;
     std::unique_ptr<DisplayLink> displayLink_;

@@ -2,9 +2,11 @@
 
 #include "app/file_list_format.h"
 #include "support/ini_store.h"
+#include "support/password_keeper.h"
 #include "support/paths.h"
 #include "support/ports.h"
 #include "support/program_home.h"
+#include "support/secret_store.h"
 #include "support/value_rules.h"
 
 namespace quorvel {
@@ -47,6 +49,24 @@ private:
     std::optional<AppError> error_;
 };
 
+// The service password lives in the desktop's secret store when the program
+// uses one and it answers; the settings file then holds "Null" for it.
+QString KeptPassword(const LocalSettings& settings, const QString& inFile) {
+    SecretStore* store = ProcessSecretStore();
+    if (!store) return inFile;
+    LocalSettings writable(settings.Path());
+    return PasswordKeeper(writable, store).Load(QStringLiteral("Password"));
+}
+
+// What the settings file is to hold for the password.
+QString PasswordForFile(LocalSettings& settings, const QString& password) {
+    SecretStore* store = ProcessSecretStore();
+    if (!store) return password;
+    PasswordKeeper keeper(settings, store);
+    keeper.Save(QStringLiteral("Password"), password);
+    return keeper.LastPlace() == PasswordKeeper::Place::SecretStore ? QString() : password;
+}
+
 } // namespace
 
 QString DefaultAfterDate(int year) {
@@ -74,7 +94,7 @@ std::optional<AppError> AppSettings::Load(const LocalSettings& settings,
     SettingsReader in(settings);
     cfgUrl = in.Text("CFG_URL", {});
     userId = in.Text("UserID", {});
-    password = in.Text("Password", {});
+    password = KeptPassword(settings, in.Text("Password", {}));
     applicationFolder = in.Text("ApplicationFolder", programFolder);
     dataFolder = in.Text("DataFolder", programFolder);
     showDate0 = CheckValue(in.Text("ShowDate0", QStringLiteral("1")));
@@ -109,7 +129,7 @@ bool AppSettings::Save(LocalSettings& settings) const {
         {"Top", SingleText(top)},
         {"CFG_URL", cfgUrl},
         {"UserID", userId},
-        {"Password", password},
+        {"Password", PasswordForFile(settings, password)},
         {"ApplicationFolder", applicationFolder},
         {"DataFolder", dataFolder},
         {"Automatic", number(automatic)},

@@ -27,10 +27,11 @@ CommandLine ParseCommandLine(const QStringList& arguments) {
     const QCommandLineOption runAll(QStringLiteral("run-all"));
     const QCommandLineOption dryRun(QStringLiteral("dry-run"));
     const QCommandLineOption quiet(QStringLiteral("quiet"));
+    const QCommandLineOption caFile(QStringLiteral("ca-file"), {}, QStringLiteral("FILE"));
     const QCommandLineOption encipher(QStringLiteral("encipher"), {}, QStringLiteral("TEXT"));
     const QCommandLineOption help(QStringList{QStringLiteral("help"), QStringLiteral("h")});
     const QCommandLineOption version(QStringLiteral("version"));
-    parser.addOptions({home, runAll, dryRun, quiet, encipher, help, version});
+    parser.addOptions({home, caFile, runAll, dryRun, quiet, encipher, help, version});
     for (const char* name : kQtValueOptions)
         parser.addOption(QCommandLineOption(QLatin1String(name), {}, QStringLiteral("VALUE")));
     for (const char* name : kQtSwitches)
@@ -51,6 +52,7 @@ CommandLine ParseCommandLine(const QStringList& arguments) {
         line.scheduled = true;
     }
     if (parser.isSet(home)) line.home = parser.values(home).constLast();
+    if (parser.isSet(caFile)) line.caFile = parser.values(caFile).constLast();
     line.runAll = parser.isSet(runAll);
     line.dryRun = parser.isSet(dryRun);
     line.quiet = parser.isSet(quiet);
@@ -67,13 +69,16 @@ QString UsageText(const QString& version) {
                "Quorvel %1\n"
                "Keeps data-logger files in step with your account on the web service.\n"
                "\n"
-               "Usage: quorvel [/S] [--home DIR]\n"
-               "       quorvel --run-all [--home DIR] [--dry-run] [--quiet]\n"
+               "Usage: quorvel [/S] [--home DIR] [--ca-file FILE]\n"
+               "       quorvel --run-all [--home DIR] [--ca-file FILE] [--dry-run] [--quiet]\n"
                "       quorvel --encipher TEXT | --version | --help\n"
                "\n"
                "  /S               start minimised and work on the schedule\n"
                "  --home DIR       keep settings, logs and the file list in DIR\n"
                "                   (also QUORVEL_HOME)\n"
+               "  --ca-file FILE   also trust the certificate authorities in FILE (PEM) for\n"
+               "                   https and FTP over TLS, as for a private service; the\n"
+               "                   setting CAFile does the same\n"
                "  --run-all        sign in, run all files of the list and end, without a\n"
                "                   window or a display (for cron or a systemd timer); one\n"
                "                   line per file and a summary on standard output\n"

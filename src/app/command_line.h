@@ -1,7 +1,7 @@
 #pragma once
 // The program's command line, read by one parser:
-//   quorvel [/S] [--home DIR]                       the window
-//   quorvel --run-all [--home DIR] [--dry-run] [--quiet]
+//   quorvel [/S] [--home DIR] [--ca-file FILE]      the window
+//   quorvel --run-all [--home DIR] [--ca-file FILE] [--dry-run] [--quiet]
 //   quorvel --encipher TEXT | --version | --help
 // "/S" may stand anywhere, in any letter case. Qt's own window options
 // (-platform, -style, ...) are let through to the window. Anything else is a
@@ -17,6 +17,7 @@ namespace quorvel {
 struct CommandLine {
     bool scheduled = false; // "/S": start minimised and work on the schedule
     std::optional<QString> home;
+    std::optional<QString> caFile; // a private certificate authority (PEM)
     bool runAll = false;
     bool dryRun = false;
     bool quiet = false;

@@ -1,7 +1,9 @@
 #include "transfer/ftp_session.h"
 
 #include "support/log_file.h"
+#include "support/masked_text.h"
 #include "support/program_home.h"
+#include "transfer/curl_tls.h"
 #include "transfer/ftp_status_events.h"
 #include "transfer/ftp_url.h"
 #include "transfer/http_fetch.h"
@@ -65,6 +67,13 @@ void FtpSession::SetDetails(const QString& server, const QString& user, const QS
     }
 }
 
+QString FtpSession::ShownServer() const {
+    QString shown = MaskUrlPassword(server_);
+    // Also where the password stands in the text in some other form.
+    if (!password_.isEmpty()) shown.replace(password_, QStringLiteral("***"));
+    return shown;
+}
+
 void FtpSession::ClearError() {
     lastError_.clear();
     detail_.clear();
@@ -98,7 +107,7 @@ bool FtpSession::Open() {
     if (RefuseNested()) return false;
     ClearError();
     CallScope scope(*this);
-    return Guarded(QStringLiteral("OpenFTP: ") + server_, [&] { return DoOpen(); });
+    return Guarded(QStringLiteral("OpenFTP: ") + ShownServer(), [&] { return DoOpen(); });
 }
 
 void FtpSession::Close() {
@@ -125,14 +134,20 @@ bool FtpSession::DoOpen() {
         return false;
     }
     ids_.callback = 1;
-    report_.Status(QStringLiteral("Connecting to ") + server_ + QStringLiteral("..."));
+    report_.Status(QStringLiteral("Connecting to ") + ShownServer() + QStringLiteral("..."));
+    QString trustError;
+    if (!ApplyTlsTrust(curl_->get(), trustError)) {
+        Fail(QStringLiteral("Failed ftp access to ") + ShownServer());
+        detail_ = trustError;
+        return false;
+    }
     curl_easy_setopt(curl_->get(), CURLOPT_NOBODY, 1L);
     if (!Perform(QString())) {
-        Fail(QStringLiteral("Failed ftp access to ") + server_);
+        Fail(QStringLiteral("Failed ftp access to ") + ShownServer());
         return false;
     }
     ids_.connection = ++connectionsMade_;
-    report_.Status(QStringLiteral("Connected to ") + server_);
+    report_.Status(QStringLiteral("Connected to ") + ShownServer());
     return true;
 }
 
@@ -153,7 +168,12 @@ void FtpSession::ConfigureHandle() {
     CURL* curl = curl_->get();
     curl_easy_setopt(curl, CURLOPT_ERRORBUFFER, errorBuffer_);
     curl_easy_setopt(curl, CURLOPT_NOSIGNAL, 1L);
-    curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "ftp");
+    // The scheme of the server text decides; a secure session that cannot be
+    // had fails instead of going on in plain text.
+    const FtpTls tls = FtpTlsOf(server_);
+    curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, tls == FtpTls::Implicit ? "ftps" : "ftp");
+    curl_easy_setopt(curl, CURLOPT_USE_SSL,
+                     static_cast<long>(tls == FtpTls::None ? CURLUSESSL_NONE : CURLUSESSL_ALL));
     curl_easy_setopt(curl, CURLOPT_USERNAME, user_.toUtf8().constData());
     curl_easy_setopt(curl, CURLOPT_PASSWORD, password_.toUtf8().constData());
     // The data connection goes to the server we logged in to, whatever address
@@ -224,7 +244,7 @@ bool FtpSession::HttpGetFileContents(const QString& url, QString& contents) {
     // Uses a handle of its own, so it may run while a transfer waits.
     ClearError();
     BusyGuard busy(CurrentBusyPointer());
-    const bool ok = Guarded(QStringLiteral("HTTPGetFileContents: ") + url, [&] {
+    const bool ok = Guarded(QStringLiteral("HTTPGetFileContents: ") + MaskUrlPassword(url), [&] {
         const HttpFetchOutcome outcome =
             FetchHttpText(url, QStringLiteral("TALUWebdData"), report_, contents);
         lastError_ = outcome.error;

@@ -46,7 +46,8 @@ public:
     FtpSession& operator=(const FtpSession&) = delete;
 
     void SetDisplay(TraceView* trace, ProgressView* progress);
-    // server: "host", "host:port", optionally with "ftp://" in front.
+    // server: "host", "host:port", optionally with "ftp://" in front, or with
+    // "ftps://" (implicit TLS) or "ftpes://" (explicit TLS, required).
     void SetDetails(const QString& server, const QString& user, const QString& password,
                     bool trace);
 
@@ -98,6 +99,8 @@ private:
     bool Guarded(const QString& where, const std::function<bool()>& body);
     void Fail(const QString& text) { lastError_ = text; }
     void ClearError();
+    // The server text as traces and messages show it: never with a password.
+    QString ShownServer() const;
 
     HandleIds ids_;
     FtpReport report_{ids_};

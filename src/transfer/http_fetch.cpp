@@ -1,7 +1,9 @@
 #include "transfer/http_fetch.h"
 
+#include "support/masked_text.h"
 #include "support/paths.h"
 #include "transfer/curl_handle.h"
+#include "transfer/curl_tls.h"
 
 #include <QStringDecoder>
 #include <QUrl>
@@ -38,7 +40,9 @@ void Prepare(CURL* curl, const QByteArray& address, const QString& userAgent, QB
     curl_easy_setopt(curl, CURLOPT_ERRORBUFFER, errorBuffer);
     curl_easy_setopt(curl, CURLOPT_NOSIGNAL, 1L);
     curl_easy_setopt(curl, CURLOPT_PROTOCOLS_STR, "http,https");
-    curl_easy_setopt(curl, CURLOPT_REDIR_PROTOCOLS_STR, "http,https");
+    // A secure address is never redirected to plain text.
+    const bool secure = address.startsWith("https:");
+    curl_easy_setopt(curl, CURLOPT_REDIR_PROTOCOLS_STR, secure ? "https" : "http,https");
     curl_easy_setopt(curl, CURLOPT_FOLLOWLOCATION, 1L);
     curl_easy_setopt(curl, CURLOPT_MAXREDIRS, 10L);
     curl_easy_setopt(curl, CURLOPT_USERAGENT, userAgent.toUtf8().constData());
@@ -72,14 +76,22 @@ HttpFetchOutcome FetchHttpText(const QString& url, const QString& userAgent, Ftp
         outcome.error = QStringLiteral("Could not connect to internet");
         return outcome;
     }
-    report.Trace(QStringLiteral("Getting: ") + address);
+    // A password in the address never reaches a trace or a message.
+    const QString shown = MaskUrlPassword(address);
+    report.Trace(QStringLiteral("Getting: ") + shown);
     QByteArray body;
     char errorBuffer[CURL_ERROR_SIZE] = {};
     Prepare(curl.get(), QUrl(address, QUrl::TolerantMode).toEncoded(), userAgent, body, errorBuffer,
             report);
+    QString trustError;
+    if (!ApplyTlsTrust(curl.get(), trustError)) {
+        outcome.error = QStringLiteral("Could not connect to ") + shown;
+        outcome.detail = trustError;
+        return outcome;
+    }
     const CURLcode code = curl_easy_perform(curl.get());
     if (code != CURLE_OK) {
-        outcome.error = QStringLiteral("Could not connect to ") + address;
+        outcome.error = QStringLiteral("Could not connect to ") + shown;
         outcome.detail = CurlErrorText(code, errorBuffer);
         return outcome;
     }
@@ -87,7 +99,7 @@ HttpFetchOutcome FetchHttpText(const QString& url, const QString& userAgent, Ftp
     curl_easy_getinfo(curl.get(), CURLINFO_RESPONSE_CODE, &status);
     if (status < 200 || status > 299) {
         // A "not found" page must never stand in for a configuration or a list.
-        outcome.error = QStringLiteral("Could not get ") + address +
+        outcome.error = QStringLiteral("Could not get ") + shown +
                         QStringLiteral(": HTTP status ") + QString::number(status);
         return outcome;
     }
@@ -95,11 +107,11 @@ HttpFetchOutcome FetchHttpText(const QString& url, const QString& userAgent, Ftp
     if (contents.startsWith(QLatin1Char('<'))) {
         report.Trace(
             QStringLiteral("HTTPGetFileContents - found html tag, so file not there ???: ") +
-            address);
-        outcome.error = QStringLiteral("An HTML page came back instead of ") + address;
+            shown);
+        outcome.error = QStringLiteral("An HTML page came back instead of ") + shown;
         return outcome;
     }
-    report.Status(QStringLiteral("Received: ") + address);
+    report.Status(QStringLiteral("Received: ") + shown);
     outcome.ok = true;
     return outcome;
 }

@@ -99,8 +99,9 @@ QStringList RequestLines(const RequestFields& f) {
     }
     const QString method =
         IsGetCommand(f.commandIndex) ? QStringLiteral("GET") : QStringLiteral("POST");
-    return {method + QStringLiteral(" http://") + f.host + FolderPath(f.webFolder) +
-                QStringLiteral("wd.php") + query + QStringLiteral(" HTTP/1.1"),
+    return {method + QLatin1Char(' ') + f.scheme + QStringLiteral("://") + f.host +
+                FolderPath(f.webFolder) + QStringLiteral("wd.php") + query +
+                QStringLiteral(" HTTP/1.1"),
             QStringLiteral("Host: ") + f.host, QStringLiteral("User-Agent: ") + f.agent, QString()};
 }
 

@@ -49,6 +49,7 @@ struct RequestFields {
     bool traceServer = false;
     QString date; // plain date text; empty when the command has none
     QString host, webFolder, agent;
+    QString scheme = QStringLiteral("http"); // "https" for an exchange over TLS
 };
 
 // The four lines of a request, without their CR LF; the last one is empty.

@@ -42,6 +42,12 @@ public:
     virtual void Close() = 0;
     virtual void SetRemotePort(int port) = 0;
     virtual void SetRemoteHost(const QString& host) = 0;
+    // Whether the next Connect runs TLS, with the certificate verified for the
+    // remote host. A socket that cannot speak TLS refuses (false), so that a
+    // secure address never goes out in plain text.
+    virtual bool SetEncrypted(bool on) { return !on; }
+    // True when the connection, or the next one, runs TLS.
+    virtual bool Encrypted() const { return false; }
     // Returns at once; the outcome shows as State 7 and Connected, or State 9 and Error.
     virtual void Connect() = 0;
     // Queues bytes for sending, in call order; false when the socket cannot take them.

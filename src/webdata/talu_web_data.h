@@ -42,6 +42,8 @@
 
 namespace quorvel {
 
+struct ServiceAddress;
+
 class CTALUWebData : public QObject, private ReplyStream::LineSink {
     Q_OBJECT
 public:
@@ -133,6 +135,7 @@ private:
     void SendReply(const QString& line);
     // Connection.
     bool OpenConnection();
+    bool ChooseEncryption(const ServiceAddress& target);
     bool WaitForReply();
     bool ReplyCameMeanwhile();
     void PumpOnce();
@@ -194,6 +197,7 @@ private:
     int httpState_ = 0;
     QString lastCommand_;
     QString lastError_;
+    QString connectError_; // why the latest connection failed, when the socket said
     QDateTime deadline_;
     DateValue serverLastDate_ = 0;
     DateValue localLastDate_ = 0;

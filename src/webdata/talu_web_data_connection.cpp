@@ -2,6 +2,7 @@
 #include "webdata/talu_web_data.h"
 
 #include "webdata/request.h"
+#include "webdata/service_address.h"
 #include "webdata/webdata_error.h"
 
 #include <QCoreApplication>
@@ -35,12 +36,14 @@ bool CTALUWebData::OpenConnection() {
         // ran the event loop, must be seen before the connection is trusted
         // again; bytes still waiting from before are dropped on the way.
         QCoreApplication::processEvents();
+        connectError_.clear();
+        const ServiceAddress target = ParseServiceAddress(remoteHost_, remotePort_);
+        if (socket_ && !ChooseEncryption(target)) return false;
         if (socket_ && socket_->State() == kSocketConnected) socket_->Refresh();
         reused_ = socket_ && socket_->State() == kSocketConnected;
         if (socket_ && socket_->State() != kSocketConnected) {
             socket_->Close();
             stream_.Clear();
-            const HostPort target = SplitHostPort(remoteHost_, remotePort_);
             socket_->SetRemotePort(target.port);
             socket_->SetRemoteHost(target.host);
             socket_->Connect();
@@ -133,7 +136,22 @@ void CTALUWebData::Disconnect() {
     DropConnection();
 }
 
+// A secure address must never be served by a plain connection: the socket
+// is switched (a connection of the other kind is closed first) or, when it
+// cannot speak TLS, nothing is sent.
+bool CTALUWebData::ChooseEncryption(const ServiceAddress& target) {
+    if (socket_->Encrypted() == target.secure || socket_->SetEncrypted(target.secure)) return true;
+    connectError_ = QStringLiteral("No secure connection to ") + target.hostPort +
+                    QStringLiteral(": this connection cannot use TLS");
+    ShowStatusText(QStringLiteral("*Not* connected to ") + remoteHost_ + QStringLiteral(": ") +
+                   connectError_);
+    return false;
+}
+
 void CTALUWebData::WError(int /*index*/, int /*number*/, const QString& description) {
+    // Why the connection failed (a refused certificate names the host and
+    // the reasons) stays for the command's LastError.
+    connectError_ = description;
     ShowStatusText(QStringLiteral("WinsockError: ") + description);
     RestorePointer();
     Q_EMIT ShowStatus(description);

@@ -7,6 +7,7 @@
 #include "webdata/last_line.h"
 #include "webdata/line_dates.h"
 #include "webdata/request.h"
+#include "webdata/service_address.h"
 #include "webdata/webdata_error.h"
 
 #include <QFileInfo>
@@ -103,7 +104,9 @@ QString CTALUWebData::FailureText(int action, bool connected) const {
     const QString command = action == kActionLastDate ? commandWords_[kCommandGetLastDate]
                             : action == kActionData   ? commandWords_[kCommandGetData]
                                                       : commandWords_[kCommandGetUserFolders];
-    if (!connected) return QStringLiteral("*Not* connected to ") + remoteHost_;
+    if (!connected)
+        return QStringLiteral("*Not* connected to ") + remoteHost_ +
+               (connectError_.isEmpty() ? QString() : QStringLiteral(": ") + connectError_);
     if (userCancel_) return QStringLiteral("Cancelled (") + command + QStringLiteral(")");
     if (closedWhileWaiting_)
         return QStringLiteral("Connection closed before the reply ended (") + command +
@@ -127,7 +130,9 @@ void CTALUWebData::SendCommand(int commandIndex, const QString& dateText) {
         fields.fileLocation = fileLocation_;
         fields.traceServer = traceServer_;
         fields.date = dateText;
-        fields.host = remoteHost_;
+        const ServiceAddress target = ParseServiceAddress(remoteHost_, remotePort_);
+        fields.host = target.hostPort;
+        fields.scheme = ServiceScheme(target);
         fields.webFolder = webFolder_;
         fields.agent = agent_;
         // Whatever is left of earlier replies is no part of this one.

@@ -1,0 +1,155 @@
+// No password in any output: traces, the trace pane's lines, status texts,
+// message boxes, the program log, ftp.log, error texts and whatever the
+// process writes to its standard error (Qt's warnings, libcurl's own verbose
+// text), over every exchange that carries one.
+#include "ftps_peer.h"
+#include "security_fixture.h"
+
+#include "transfer/ftp.h"
+
+#include <QDir>
+#include <QUrl>
+
+#include <cstdio>
+#include <unistd.h>
+
+namespace quorvel::testing {
+namespace {
+
+const QString kFtpPassword = QStringLiteral("Pw-9ftp#x:y@z");
+
+QString Encoded(const QString& password) {
+    return QString::fromLatin1(QUrl::toPercentEncoding(password));
+}
+
+// Everything the process writes to its standard error while it lives.
+class StderrCapture {
+public:
+    explicit StderrCapture(const QString& path) : path_(path) {
+        std::fflush(stderr);
+        saved_ = dup(STDERR_FILENO);
+        if (FILE* file = std::fopen(path.toLocal8Bit().constData(), "w")) {
+            dup2(fileno(file), STDERR_FILENO);
+            std::fclose(file);
+        }
+    }
+    ~StderrCapture() { Restore(); }
+    QString Text() {
+        Restore();
+        QFile file(path_);
+        return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : QString();
+    }
+
+private:
+    void Restore() {
+        if (saved_ < 0) return;
+        std::fflush(stderr);
+        dup2(saved_, STDERR_FILENO);
+        close(saved_);
+        saved_ = -1;
+    }
+    QString path_;
+    int saved_ = -1;
+};
+
+QString ReadFile(const QString& path) {
+    QFile file(path);
+    return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : QString();
+}
+
+TEST_F(TlsServiceTest, NoOutputEverShowsAPassword) {
+    QTemporaryDir certs, ftpRoot;
+    QString error;
+    ASSERT_TRUE(MakeTestCertificates(certs.path(), error)) << error.toStdString();
+    TlsTrust::SetExtraCaFiles({web.CaFile(), certs.filePath(QStringLiteral("ca.pem"))});
+    QFile(ftpRoot.filePath(QStringLiteral("site1.dat"))).open(QIODevice::WriteOnly);
+    FtpsPeer ftp;
+    ASSERT_TRUE(ftp.Start(QStringLiteral("explicit"), ftpRoot.path(), certs.path(),
+                          QStringLiteral("good"), kFtpPassword));
+    RecordingTraceView ftpTrace;
+    SetFTPDisplay(&ftpTrace, nullptr);
+    // curl prints its verbose text to standard error when nothing takes it.
+    StderrCapture captured(home.File(QStringLiteral("stderr.txt")));
+
+    // The service: success, a refused password, a refused certificate, a
+    // password with every character a careless request would break on.
+    object.SetRemoteHost(web.Address(TlsSite::Good));
+    ASSERT_TRUE(object.Initialise()) << object.LastError().toStdString();
+    const QString local = home.Write(QStringLiteral("site1.dat"), "");
+    object.GetNewData(local, 1, 1);
+    QStringList lastErrors{object.LastError()};
+    object.SetPassword(kAnnPassword + QStringLiteral("\r\nX-Injected: 1"));
+    EXPECT_FALSE(object.Initialise());
+    lastErrors << object.LastError();
+    ShortGap();
+    object.Disconnect();
+    object.SetRemoteHost(web.Address(TlsSite::Expired));
+    EXPECT_FALSE(object.Initialise());
+    lastErrors << object.LastError();
+
+    // Fetches with the password inside the address, traced (curl's waits
+    // follow the reply gap: a sanitizer build's handshakes are slow).
+    clock.SetWaits(WaitLengths{.replyGap = std::chrono::milliseconds(5000)});
+    const QString site = QStringLiteral("@localhost:") + QString::number(web.Port(TlsSite::Good));
+    const QString withUser = QStringLiteral("https://ann:") + Encoded(kAnnPassword) + site;
+    SetFTPDetails(QStringLiteral("localhost"), QStringLiteral("logger"), kFtpPassword, true);
+    QString body;
+    EXPECT_TRUE(HTTPGetFileContents(withUser + QStringLiteral("/cfg/ann.cfg"), body))
+        << ftpLastError().toStdString();
+    EXPECT_FALSE(HTTPGetFileContents(withUser + QStringLiteral("/nothing"), body));
+    lastErrors << ftpLastError();
+    // Typed into the address unescaped, it makes no valid address, and is not shown either.
+    EXPECT_FALSE(HTTPGetFileContents(QStringLiteral("https://ann:") + kAnnPassword + site +
+                                         QStringLiteral("/cfg/ann.cfg"),
+                                     body));
+    lastErrors << ftpLastError();
+
+    // FTP over TLS, the password given apart and inside the server address.
+    const QString ftpHost = QStringLiteral("localhost:") + QString::number(ftp.Port());
+    SetFTPDetails(QStringLiteral("ftpes://logger:") + Encoded(kFtpPassword) + QLatin1Char('@') +
+                      ftpHost,
+                  QStringLiteral("logger"), kFtpPassword, true);
+    EXPECT_TRUE(ftpDownLoadFile(QStringLiteral("site1.dat"), home.File(QStringLiteral("f.dat"))))
+        << ftpLastError().toStdString();
+    EXPECT_FALSE(ftpDownLoadFile(QStringLiteral("missing.dat"), home.File(QStringLiteral("g"))));
+    lastErrors << ftpLastError();
+    SetFTPDetails(QStringLiteral("ftpes://logger:") + kFtpPassword + QLatin1Char('@') + ftpHost,
+                  QStringLiteral("logger"), kFtpPassword, true);
+    EXPECT_FALSE(ftpDownLoadFile(QStringLiteral("site1.dat"), home.File(QStringLiteral("h"))));
+    lastErrors << ftpLastError();
+    SetFTPDetails(QStringLiteral("ftpes://") + ftpHost, QStringLiteral("logger"),
+                  QStringLiteral("wrong ") + kFtpPassword, true);
+    EXPECT_FALSE(ftpUploadFile(local, QStringLiteral("up.dat")));
+    lastErrors << ftpLastError();
+    ftpClose();
+    SetFTPDisplay(nullptr, nullptr);
+
+    QStringList boxes;
+    for (const auto& shown : prompter.shown)
+        boxes << shown.message;
+    const QMap<QString, QString> outputs{
+        {QStringLiteral("web-data traces"), traces.join(QLatin1Char('\n'))},
+        {QStringLiteral("status texts"), statuses.join(QLatin1Char('\n'))},
+        {QStringLiteral("FTP traces"), ftpTrace.traces.join(QLatin1Char('\n'))},
+        {QStringLiteral("FTP status texts"), ftpTrace.statuses.join(QLatin1Char('\n'))},
+        {QStringLiteral("message boxes"), boxes.join(QLatin1Char('\n'))},
+        {QStringLiteral("error texts"), lastErrors.join(QLatin1Char('\n'))},
+        {QStringLiteral("program log"), ProgramLog()},
+        {QStringLiteral("ftp.log"), ReadFile(ProgramHome::FtpLogFile())},
+        {QStringLiteral("standard error"), captured.Text()},
+    };
+    // The outputs did record the exchanges: an empty check would pass anyway.
+    EXPECT_TRUE(
+        outputs.value(QStringLiteral("web-data traces")).contains(QStringLiteral("pwd=***")));
+    EXPECT_TRUE(outputs.value(QStringLiteral("FTP traces")).contains(QStringLiteral("Getting: ")));
+    EXPECT_TRUE(outputs.value(QStringLiteral("ftp.log")).contains(QStringLiteral("site1.dat")));
+    EXPECT_TRUE(outputs.value(QStringLiteral("program log")).contains(QStringLiteral("S>GET")));
+    for (auto it = outputs.begin(); it != outputs.end(); ++it) {
+        SCOPED_TRACE(it.key().toStdString());
+        for (const QString& secret : {QStringLiteral("Tr0ub"), QStringLiteral("Pw-9ftp")})
+            EXPECT_FALSE(it.value().contains(secret)) << it.value().toStdString();
+    }
+}
+
+} // namespace
+} // namespace quorvel::testing
