@@ -134,8 +134,15 @@ void frm_WebDataClient::Form_Activate() {
 bool frm_WebDataClient::Initialise() {
     BusyGuard busy(CurrentBusyPointer());
     bool listFromService = false;
-    if (!AccountSteps(listFromService)) return false;
-    if (!listFromService && !OpenFileList(recent_.Entry(1))) return false;
+    const bool signedIn = AccountSteps(listFromService);
+    // When the service cannot be reached (offline, no account yet) the list on
+    // this PC still opens: the user's own list, or at start-up the copy of the
+    // service's list saved by the last session. The failed step's reason stays
+    // in the status line.
+    const bool ownList = c_.Opt_GetLocalFolders->SelectedIndex() != 1;
+    const bool openLocal = signedIn ? !listFromService : ownList || files_.Count() == 0;
+    if (openLocal && !OpenFileList(recent_.Entry(1))) return false;
+    if (!signedIn) return false;
     ShowStatus(QString());
     return true;
 }
