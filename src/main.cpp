@@ -125,8 +125,8 @@ int LeaveToOpenWindow(quorvel::WindowInstance& instance, bool scheduled) {
         QStringLiteral("Quorvel is already running on %1 (%2), but its window does not answer.")
             .arg(home, instance.LockPath());
     err << text << "\n";
-    QMessageBox::warning(nullptr, QString::fromLatin1(quorvel::frm_WebDataClient::kApplicationTitle),
-                         text);
+    QMessageBox::warning(nullptr,
+                         QString::fromLatin1(quorvel::frm_WebDataClient::kApplicationTitle), text);
     return 1;
 }
 
@@ -151,7 +151,8 @@ int main(int argc, char* argv[]) {
     const auto secrets = quorvel::MakeDesktopSecretStore(std::chrono::seconds(30));
     quorvel::SetProcessSecretStore(secrets.get());
 
-    const QStringList arguments = line.scheduled ? QStringList{QStringLiteral("/S")} : QStringList{};
+    const QStringList arguments =
+        line.scheduled ? QStringList{QStringLiteral("/S")} : QStringList{};
     quorvel::frm_WebDataClient window(arguments);
     quorvel::WindowPorts ports(&window, line.scheduled);
     QObject::connect(&instance, &quorvel::WindowInstance::ShowRequested, &window, [&window] {

@@ -7,10 +7,10 @@ namespace quorvel {
 namespace {
 
 // Qt's own options for a window, taken by QApplication itself.
-constexpr const char* kQtValueOptions[] = {"platform", "platformpluginpath", "platformtheme",
-                                           "plugin", "qwindowgeometry", "qwindowicon",
-                                           "qwindowtitle", "session", "style", "stylesheet",
-                                           "display", "geometry", "qmljsdebugger"};
+constexpr const char* kQtValueOptions[] = {
+    "platform",    "platformpluginpath", "platformtheme", "plugin", "qwindowgeometry",
+    "qwindowicon", "qwindowtitle",       "session",       "style",  "stylesheet",
+    "display",     "geometry",           "qmljsdebugger"};
 constexpr const char* kQtSwitches[] = {"reverse", "widgetcount", "nograb", "dograb", "sync"};
 
 bool IsScheduleSwitch(const QString& argument) {

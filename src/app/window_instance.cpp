@@ -14,7 +14,8 @@ constexpr char kShowAnswer[] = "shown\n";
 QString NameFor(const QString& folder) {
     const QByteArray key = (QDir(folder).absolutePath() + u'|' + QDir::homePath()).toUtf8();
     return QStringLiteral("quorvel-") +
-           QString::fromLatin1(QCryptographicHash::hash(key, QCryptographicHash::Sha1).toHex().left(16));
+           QString::fromLatin1(
+               QCryptographicHash::hash(key, QCryptographicHash::Sha1).toHex().left(16));
 }
 
 } // namespace

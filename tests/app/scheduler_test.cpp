@@ -25,7 +25,8 @@ class NextDueTest : public ::testing::TestWithParam<DueCase> {};
 TEST_P(NextDueTest, LabelsFollowTheGridFromMidnight) {
     const DueCase& c = GetParam();
     const DateValue now = DateFromText(QString::fromUtf8(c.now));
-    const DueLabels labels = CalculateNextProcessDue(c.automatic, QString::fromUtf8(c.interval), now);
+    const DueLabels labels =
+        CalculateNextProcessDue(c.automatic, QString::fromUtf8(c.interval), now);
     EXPECT_EQ(labels.kind, c.kind);
     EXPECT_EQ(labels.next.toStdString(), c.next);
     EXPECT_EQ(labels.dueIn.toStdString(), c.dueIn);
@@ -43,15 +44,16 @@ INSTANTIATE_TEST_SUITE_P(
     Grid, NextDueTest,
     ::testing::Values(
         DueCase{"Manual", false, "3 hours", k1020, DueLabels::kManual, " -", " -"},
-        DueCase{"ThreeHours", true, "3 hours", k1020, DueLabels::kDue, "1 Nov 2024 12:00", "01:40:00"},
-        DueCase{"ThreeHoursLateEvening", true, "3 hours", "1 Nov 2024 23:10:00",
-                DueLabels::kDue, "2 Nov 2024 00:00", "00:50:00"},
+        DueCase{"ThreeHours", true, "3 hours", k1020, DueLabels::kDue, "1 Nov 2024 12:00",
+                "01:40:00"},
+        DueCase{"ThreeHoursLateEvening", true, "3 hours", "1 Nov 2024 23:10:00", DueLabels::kDue,
+                "2 Nov 2024 00:00", "00:50:00"},
         DueCase{"DefaultSettingText", true, "3 hrs", k1020, DueLabels::kDue, "1 Nov 2024 12:00",
                 "01:40:00"},
         DueCase{"OneDayAtMidnightIsTheNextMidnight", true, "1 day", "1 Nov 2024 00:00:00",
                 DueLabels::kDue, "2 Nov 2024 00:00", "1 day 00:00"},
-        DueCase{"OneDayLateInTheDay", true, "1 day", "1 Nov 2024 23:59:59",
-                DueLabels::kDue, "2 Nov 2024 00:00", "00:00:01"},
+        DueCase{"OneDayLateInTheDay", true, "1 day", "1 Nov 2024 23:59:59", DueLabels::kDue,
+                "2 Nov 2024 00:00", "00:00:01"},
         DueCase{"HalfHours", true, "30 minutes", k1020, DueLabels::kDue, "1 Nov 2024 10:30",
                 "00:10:00"},
         DueCase{"OnAGridPointTheNextOne", true, "15 minutes", "1 Nov 2024 10:15:00",
@@ -101,25 +103,26 @@ TEST_P(TickTest, DecidesRunOrCountdown) {
 
 INSTANTIATE_TEST_SUITE_P(
     Ticks, TickTest,
-    ::testing::Values(
-        TickCase{"ManualOnlyRefreshesNow", false, false, "1 Nov 2024 10:20:00", "1 Nov 2024 09:00",
-                 "3 hours", true, false, "", ""},
-        TickCase{"PastDueStartsARun", true, false, "1 Nov 2024 10:20:00", "1 Nov 2024 09:00",
-                 "3 hours", false, true, "", ""},
-        TickCase{"PastDueWhileBusyStartsNone", true, true, "1 Nov 2024 10:20:00",
-                 "1 Nov 2024 09:00", "3 hours", false, false, "", ""},
-        TickCase{"EmptyDueReadsAsLongPast", true, false, "1 Nov 2024 10:20:00", "", "3 hours",
-                 false, true, "", ""},
-        TickCase{"UnusableIntervalNeverRunsEveryTick", true, false, "1 Nov 2024 10:20:00",
-                 "1 Nov 2024 09:00", "3 x", false, false, "", ""},
-        TickCase{"DueNowIsNotYetPast", true, false, "1 Nov 2024 13:00:00", "1 Nov 2024 13:00",
-                 "3 hours", false, false, "", ""},
-        TickCase{"DueNowMinimisedShowsZeroLeft", true, false, "1 Nov 2024 13:00:00",
-                 "1 Nov 2024 13:00", "3 hours", true, false, "", "Due in: 00:00:00"},
-        TickCase{"WaitingCountsDown", true, false, "1 Nov 2024 10:20:00", "1 Nov 2024 13:00",
-                 "3 hours", false, false, "02:40", ""},
-        TickCase{"WaitingMinimisedSetsTheCaption", true, false, "1 Nov 2024 10:20:10",
-                 "1 Nov 2024 13:00", "3 hours", true, false, "02:39", "Due in: 02:39"}),
+    ::testing::Values(TickCase{"ManualOnlyRefreshesNow", false, false, "1 Nov 2024 10:20:00",
+                               "1 Nov 2024 09:00", "3 hours", true, false, "", ""},
+                      TickCase{"PastDueStartsARun", true, false, "1 Nov 2024 10:20:00",
+                               "1 Nov 2024 09:00", "3 hours", false, true, "", ""},
+                      TickCase{"PastDueWhileBusyStartsNone", true, true, "1 Nov 2024 10:20:00",
+                               "1 Nov 2024 09:00", "3 hours", false, false, "", ""},
+                      TickCase{"EmptyDueReadsAsLongPast", true, false, "1 Nov 2024 10:20:00", "",
+                               "3 hours", false, true, "", ""},
+                      TickCase{"UnusableIntervalNeverRunsEveryTick", true, false,
+                               "1 Nov 2024 10:20:00", "1 Nov 2024 09:00", "3 x", false, false, "",
+                               ""},
+                      TickCase{"DueNowIsNotYetPast", true, false, "1 Nov 2024 13:00:00",
+                               "1 Nov 2024 13:00", "3 hours", false, false, "", ""},
+                      TickCase{"DueNowMinimisedShowsZeroLeft", true, false, "1 Nov 2024 13:00:00",
+                               "1 Nov 2024 13:00", "3 hours", true, false, "", "Due in: 00:00:00"},
+                      TickCase{"WaitingCountsDown", true, false, "1 Nov 2024 10:20:00",
+                               "1 Nov 2024 13:00", "3 hours", false, false, "02:40", ""},
+                      TickCase{"WaitingMinimisedSetsTheCaption", true, false, "1 Nov 2024 10:20:10",
+                               "1 Nov 2024 13:00", "3 hours", true, false, "02:39",
+                               "Due in: 02:39"}),
     [](const auto& info) { return std::string(info.param.name); });
 
 } // namespace

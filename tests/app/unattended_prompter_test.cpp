@@ -20,7 +20,7 @@ struct BoxCase {
     const char* name;
     bool system; // the waiting box (SystemMsgBox) or the timed one
     int buttons;
-    int answer;  // without a window
+    int answer; // without a window
     const char* logged;
 };
 

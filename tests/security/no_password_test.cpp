@@ -194,8 +194,9 @@ TEST(CommandLineRunPasswords, NoOutputOfTheCommandLineRunShowsAPassword) {
         {QStringLiteral("program log"), ReadFile(home.File(QStringLiteral("quorvel.log")))},
         {QStringLiteral("ftp.log"), ReadFile(home.File(QStringLiteral("ftp.log")))},
     };
-    EXPECT_TRUE(outputs.first().contains(QStringLiteral("Login failed")));
-    EXPECT_TRUE(outputs.first().contains(QStringLiteral("[3/3] Gone: failed")));
+    const QString printedText = outputs.value(QStringLiteral("standard output and error"));
+    EXPECT_TRUE(printedText.contains(QStringLiteral("Login failed"))) << printedText.toStdString();
+    EXPECT_TRUE(printedText.contains(QStringLiteral("[3/3] Gone: failed")));
     EXPECT_TRUE(outputs.value(QStringLiteral("ftp.log")).contains(QStringLiteral("site1.dat")));
     for (auto it = outputs.begin(); it != outputs.end(); ++it) {
         SCOPED_TRACE(it.key().toStdString());

@@ -92,7 +92,8 @@ TEST_P(CfgLineEndTest, TheFiveLinesFillTheFtpAndWebFields) {
     EXPECT_EQ(login.GetSecureFTPDetails(fields), c.ok) << login.LastError().toStdString();
     EXPECT_EQ(fields.gotSecure, c.ok);
     if (!c.ok) {
-        EXPECT_TRUE(login.LastError().contains("4 of its 5 lines")) << login.LastError().toStdString();
+        EXPECT_TRUE(login.LastError().contains("4 of its 5 lines"))
+            << login.LastError().toStdString();
         EXPECT_TRUE(fields.ftpServer.isEmpty());
         return;
     }
@@ -224,7 +225,8 @@ TEST(FileListAddressTest, OneSlashBetweenServerAndFolder) {
         {"example.org/", "", "example.org/files.txt"},
     };
     for (const AddressCase& c : cases)
-        EXPECT_EQ(FileListAddress(c.server, c.userFolder), c.address) << c.server << " + " << c.userFolder;
+        EXPECT_EQ(FileListAddress(c.server, c.userFolder), c.address)
+            << c.server << " + " << c.userFolder;
 }
 
 TEST(LocationFolderTest, TheServicesLeadingSlashDoesNotDoubleTheSeparator) {

@@ -65,15 +65,16 @@ std::int64_t LinesFrom(const QString& file, std::int64_t offset) {
 }
 
 QString Counted(std::int64_t count, const char* one, const char* many) {
-    return FormatThousands(static_cast<double>(count)) + u' ' + QLatin1String(count == 1 ? one : many);
+    return FormatThousands(static_cast<double>(count)) + u' ' +
+           QLatin1String(count == 1 ? one : many);
 }
 
 // What moved for one file, in a few words.
 QString Movement(const FileRecord& record, const FileOutcome& out) {
     if (out.fromDateChoice) {
-        return *out.fromDateChoice == 1 ? QStringLiteral("the records after it take data after ") +
-                                              out.afterDate
-                                        : QStringLiteral("the records after it take new data");
+        return *out.fromDateChoice == 1
+                   ? QStringLiteral("the records after it take data after ") + out.afterDate
+                   : QStringLiteral("the records after it take new data");
     }
     QStringList parts;
     if (IsCommandRecord(record, "DIR")) parts << QStringLiteral("wrote the directory listing");
@@ -81,7 +82,8 @@ QString Movement(const FileRecord& record, const FileOutcome& out) {
         const std::int64_t now = SizeOf(out.downloadedFile);
         if (out.newRecords) {
             // A file without dates is replaced, not appended to.
-            const std::int64_t from = out.sizeBefore >= 0 && now >= out.sizeBefore ? out.sizeBefore : 0;
+            const std::int64_t from =
+                out.sizeBefore >= 0 && now >= out.sizeBefore ? out.sizeBefore : 0;
             const std::int64_t lines = LinesFrom(out.downloadedFile, from);
             parts << (lines == 0 ? QStringLiteral("no new records")
                                  : QStringLiteral("downloaded ") +
@@ -91,7 +93,8 @@ QString Movement(const FileRecord& record, const FileOutcome& out) {
         }
     }
     if (out.uploaded) {
-        parts << (out.uploadedFile.isEmpty() || (record.MethodID == kMethodOnlyNewData && record.Zip == 0)
+        parts << (out.uploadedFile.isEmpty() ||
+                          (record.MethodID == kMethodOnlyNewData && record.Zip == 0)
                       ? QStringLiteral("uploaded nothing (new records are not sent)")
                       : QStringLiteral("uploaded ") + ShortSize(SizeOf(out.uploadedFile)));
     }
@@ -120,13 +123,14 @@ public:
             what = Movement(record, out);
         } else {
             // A failure that gave no reason of its own has shown one in a box.
-            const QString reason = !out.reason.isEmpty()               ? out.reason
-                                   : lastMessage_ != messageBefore_ ? lastMessage_
-                                                                    : QStringLiteral("no reason given");
+            const QString reason = !out.reason.isEmpty() ? out.reason
+                                   : lastMessage_ != messageBefore_
+                                       ? lastMessage_
+                                       : QStringLiteral("no reason given");
             what = QStringLiteral("failed: ") + OneLine(reason);
         }
-        out_ << QStringLiteral("[%1/%2] ").arg(number_).arg(total_) << NameOf(record) << ": " << what
-             << Qt::endl;
+        out_ << QStringLiteral("[%1/%2] ").arg(number_).arg(total_) << NameOf(record) << ": "
+             << what << Qt::endl;
     }
 
 private:
@@ -261,9 +265,10 @@ int CommandLineRun::Exec() {
     run.account = WithAccount(base, fields);
     run.downloadOnly = values.downloadOnly != 0;
     if (!CheckDataFolders(run.folders))
-        return CouldNotStart(QStringLiteral("The folders cannot be used: ") +
-                             run.folders.application + QStringLiteral(", ") + run.folders.data +
-                             (lastMessage.isEmpty() ? QString() : QStringLiteral(" (") + lastMessage + u')'));
+        return CouldNotStart(
+            QStringLiteral("The folders cannot be used: ") + run.folders.application +
+            QStringLiteral(", ") + run.folders.data +
+            (lastMessage.isEmpty() ? QString() : QStringLiteral(" (") + lastMessage + u')'));
 
     if (options_.dryRun) {
         DryRun(list, run, services, out_);
@@ -276,8 +281,10 @@ int CommandLineRun::Exec() {
     engine.SetRunLock(&lock);
     QString nextDue = values.nextDownloadDue;
     engine.CalculateNextProcessDue = [&] {
-        const DueLabels labels = CalculateNextProcessDue(values.automatic == 1, values.interval, NowValue());
-        if (labels.kind == DueLabels::kDue || labels.kind == DueLabels::kManual) nextDue = labels.next;
+        const DueLabels labels =
+            CalculateNextProcessDue(values.automatic == 1, values.interval, NowValue());
+        if (labels.kind == DueLabels::kDue || labels.kind == DueLabels::kManual)
+            nextDue = labels.next;
     };
     ListRunHost host(list, run);
     LinePrinter printer(out_, options_.quiet, lastMessage);

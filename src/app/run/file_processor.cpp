@@ -68,15 +68,16 @@ void FileProcessor::Decide(FilePlan& p, const FileRecord& record, const RunSetti
     p.facts.listDay = DayFromText(record.FileDate);
     p.facts.localDay = DayFromText(record.FileDateLocal);
     if (NeedsRemoteCheck(rules, settings.downloadOnly)) {
-        p.facts.remoteExists = services_.WholeFiles().RemoteFileExists(
-            rules.zip ? ZipFileName(p.remote) : p.remote);
+        p.facts.remoteExists =
+            services_.WholeFiles().RemoteFileExists(rules.zip ? ZipFileName(p.remote) : p.remote);
     }
     p.plan = DecideTransfers(rules, p.facts);
 }
 
 FilePlan FileProcessor::Plan(const FileRecord& record, const RunSettings& settings) {
     FilePlan p = Locate(record, settings);
-    if (p.kind == FilePlan::kTransfer || p.kind == FilePlan::kDirectory) Decide(p, record, settings);
+    if (p.kind == FilePlan::kTransfer || p.kind == FilePlan::kDirectory)
+        Decide(p, record, settings);
     return p;
 }
 

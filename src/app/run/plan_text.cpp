@@ -12,8 +12,8 @@ QString DayText(std::int32_t day) {
 
 QString DateReason(const TransferFacts& facts, bool later) {
     return QStringLiteral("Date: the list's date %1 is %2 the local copy's %3")
-        .arg(DayText(facts.listDay), later ? QStringLiteral("later than")
-                                           : QStringLiteral("not later than"),
+        .arg(DayText(facts.listDay),
+             later ? QStringLiteral("later than") : QStringLiteral("not later than"),
              DayText(facts.localDay));
 }
 
@@ -50,8 +50,10 @@ QString UploadReason(const FileRecord& record, const FilePlan& p) {
 
 QString What(int method, bool zip, const AccountSettings& account, bool down) {
     if (method != kMethodOnlyNewData)
-        return zip ? QStringLiteral("the complete file, zipped") : QStringLiteral("the complete file");
-    if (!down) return QStringLiteral("new records (nothing is sent: the service takes files by FTP)");
+        return zip ? QStringLiteral("the complete file, zipped")
+                   : QStringLiteral("the complete file");
+    if (!down)
+        return QStringLiteral("new records (nothing is sent: the service takes files by FTP)");
     if (account.fromDateChoice == 1)
         return QStringLiteral("new records after ") + account.afterDate;
     return QStringLiteral("new records after the local copy's last record");
@@ -73,22 +75,20 @@ QString DescribePlan(const FileRecord& record, const FilePlan& p, const AccountS
     case FilePlan::kDirectory:
         break;
     }
-    QString line = p.kind == FilePlan::kDirectory
-                       ? QStringLiteral("write the directory listing to ") + p.local +
-                             QStringLiteral("; ")
-                       : QString();
+    QString line =
+        p.kind == FilePlan::kDirectory
+            ? QStringLiteral("write the directory listing to ") + p.local + QStringLiteral("; ")
+            : QString();
     const bool zip = record.Zip != 0;
-    line += p.plan.download ? QStringLiteral("download ") +
-                                  What(p.plan.downloadMethod, zip, account, true) +
-                                  QStringLiteral(" from ") + p.remote + QStringLiteral(" to ") +
-                                  p.local
-                            : QStringLiteral("no download");
+    line += p.plan.download
+                ? QStringLiteral("download ") + What(p.plan.downloadMethod, zip, account, true) +
+                      QStringLiteral(" from ") + p.remote + QStringLiteral(" to ") + p.local
+                : QStringLiteral("no download");
     line += QStringLiteral(" (") + DownloadReason(record, p) + QStringLiteral("); ");
-    line += p.plan.upload ? QStringLiteral("upload ") +
-                                What(p.plan.uploadMethod, zip, account, false) +
-                                QStringLiteral(" from ") + p.local + QStringLiteral(" to ") +
-                                p.remote
-                          : QStringLiteral("no upload");
+    line += p.plan.upload
+                ? QStringLiteral("upload ") + What(p.plan.uploadMethod, zip, account, false) +
+                      QStringLiteral(" from ") + p.local + QStringLiteral(" to ") + p.remote
+                : QStringLiteral("no upload");
     line += QStringLiteral(" (") + UploadReason(record, p) + u')';
     return line;
 }

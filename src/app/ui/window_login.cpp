@@ -122,9 +122,9 @@ void frm_WebDataClient::Cmd_Login_Click() {
         box->setChecked(false);
     flags_.InMessage = true;
     if (!GetSecureFTPDetails()) {
-        CurrentPrompter().SystemMsgBox(
-            QStringLiteral("Could not get details from: ") + c_.Txt_CFG_URL->text(),
-            kButtonsOk | kIconExclamation);
+        CurrentPrompter().SystemMsgBox(QStringLiteral("Could not get details from: ") +
+                                           c_.Txt_CFG_URL->text(),
+                                       kButtonsOk | kIconExclamation);
         return;
     }
     if (!GetUserDetails()) {
@@ -133,8 +133,8 @@ void frm_WebDataClient::Cmd_Login_Click() {
         return;
     }
     if (c_.Opt_GetLocalFolders->SelectedIndex() == 1) GetFileListFromServer();
-    CurrentPrompter().SystemMsgBox(c_.Lbl_UserName->text() + QStringLiteral(" - welcome to Quorvel"),
-                                   kButtonsOk);
+    CurrentPrompter().SystemMsgBox(
+        c_.Lbl_UserName->text() + QStringLiteral(" - welcome to Quorvel"), kButtonsOk);
 }
 
 void frm_WebDataClient::Cmd_GetCFG_Click() {
