@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 namespace quorvel {
 namespace {
 
@@ -19,6 +21,10 @@ struct LineCase {
     const char* home = nullptr;
     const char* caFile = nullptr;
 };
+// The case's name in test listings.
+void PrintTo(const LineCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class CommandLineTest : public ::testing::TestWithParam<LineCase> {};
 

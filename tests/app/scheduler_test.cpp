@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 namespace quorvel {
 namespace {
 
@@ -19,6 +21,10 @@ struct DueCase {
     const char* next;  // "Next:" after the computation
     const char* dueIn; // "Due in:" after the computation
 };
+// The case's name in test listings.
+void PrintTo(const DueCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class NextDueTest : public ::testing::TestWithParam<DueCase> {};
 
@@ -85,6 +91,10 @@ struct TickCase {
     const char* dueIn;   // "" when the tick leaves "Due in:" alone
     const char* caption; // "" when the tick leaves the caption alone
 };
+// The case's name in test listings.
+void PrintTo(const TickCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class TickTest : public ::testing::TestWithParam<TickCase> {};
 

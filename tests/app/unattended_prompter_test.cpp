@@ -10,6 +10,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 namespace quorvel {
 namespace {
 
@@ -23,6 +25,10 @@ struct BoxCase {
     int answer; // without a window
     const char* logged;
 };
+// The case's name in test listings.
+void PrintTo(const BoxCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class UnattendedBoxTest : public ::testing::TestWithParam<BoxCase> {
 protected:

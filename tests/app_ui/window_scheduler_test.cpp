@@ -72,16 +72,17 @@ TEST_F(WindowSchedulerTest, FirstTickAfterAMinuteThenEveryTenSeconds) {
     EXPECT_EQ(timer.interval(), 10000);
     EXPECT_TRUE(window->Scheduler().Ticking());
 
-    // Shortened lengths come from the clock port, not from the window.
+    // Other lengths come from the clock port, not from the window (long
+    // enough that the timer itself never fires during the test).
     Close();
     WaitLengths waits;
-    waits.firstTick = std::chrono::milliseconds(30);
-    waits.tick = std::chrono::milliseconds(5);
+    waits.firstTick = std::chrono::milliseconds(45000);
+    waits.tick = std::chrono::milliseconds(7000);
     clock.SetWaits(waits);
     StartScheduled("1 Nov 2024 13:00");
-    EXPECT_EQ(window->Scheduler().Timer1().interval(), 30);
+    EXPECT_EQ(window->Scheduler().Timer1().interval(), 45000);
     Tick();
-    EXPECT_EQ(window->Scheduler().Timer1().interval(), 5);
+    EXPECT_EQ(window->Scheduler().Timer1().interval(), 7000);
 }
 
 TEST_F(WindowSchedulerTest, WaitingTicksCountDownAndShowTheTimeLeftWhileMinimised) {

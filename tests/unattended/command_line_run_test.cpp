@@ -18,6 +18,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 #include <csignal>
 #include <iostream>
 
@@ -148,6 +150,10 @@ struct OutputCase {
     int code;
     QStringList lines; // patterns of the standard output's lines
 };
+// The case's name in test listings.
+void PrintTo(const OutputCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class OutputTest : public CommandLineRunTest, public ::testing::WithParamInterface<OutputCase> {};
 
@@ -206,6 +212,10 @@ struct StartCase {
     const char* value;
     const char* err; // what standard error says
 };
+// The case's name in test listings.
+void PrintTo(const StartCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class CouldNotStartTest : public CommandLineRunTest,
                           public ::testing::WithParamInterface<StartCase> {};

@@ -18,6 +18,8 @@
 
 #include <gtest/gtest.h>
 
+#include <ostream>
+
 #include <iostream>
 
 namespace quorvel::testing {
@@ -83,6 +85,10 @@ struct CfgCase {
     int lines;
     bool ok;
 };
+// The case's name in test listings.
+void PrintTo(const CfgCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class CfgLineEndTest : public LoginTest, public ::testing::WithParamInterface<CfgCase> {};
 
@@ -165,6 +171,10 @@ struct ListCase {
     const char* name;
     const char* lineEnd;
 };
+// The case's name in test listings.
+void PrintTo(const ListCase& c, std::ostream* out) {
+    *out << c.name;
+}
 
 class FileListLineEndTest : public LoginTest, public ::testing::WithParamInterface<ListCase> {};
 
