@@ -241,6 +241,11 @@ INSTANTIATE_TEST_SUITE_P(
                   "http://127.0.0.1:1/none.cfg",
                   "Could not get details from: http://127.0.0.1:1/none.cfg"},
         StartCase{"WrongPassword", {"--run-all"}, "Password", "wrong", "Login failed"},
+        StartCase{"NoPasswordWithoutASecretStore",
+                  {"--run-all"},
+                  "Password",
+                  "",
+                  "No password for user ann"},
         StartCase{"UnknownOption", {"--run-all", "--fast"}, "", "", "Exit codes of --run-all"},
         StartCase{"QuietWithoutRunAll", {"--quiet"}, "", "", "--dry-run and --quiet go with"}),
     [](const auto& info) { return std::string(info.param.name); });

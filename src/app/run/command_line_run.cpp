@@ -230,6 +230,14 @@ int CommandLineRun::Exec() {
                                             "in once from the window, or set it there")
                                  .arg(settings.Path()));
 
+    // The window may have moved the password into the desktop's secret store,
+    // which a run from cron cannot reach: say so rather than "Login failed".
+    if (values.password.isEmpty())
+        return CouldNotStart(QStringLiteral("No password for user %1: neither %2 nor a secret "
+                                            "store that answers here holds one (run inside the "
+                                            "desktop session, or set Password in %2)")
+                                 .arg(values.userId, settings.Path()));
+
     NoTrace trace;
     AppServices services;
     services.SetViews(&trace, nullptr, nullptr);
