@@ -165,5 +165,18 @@ TEST_F(WindowSchedulerTest, ATickWhileAnotherProcessRunsSkipsAndTriesAgain) {
     EXPECT_EQ(Last(), "1 Nov 2024 10:20:10");
 }
 
+TEST_F(WindowSchedulerTest, ProcessAllWhileAnotherProcessRunsTellsTheUser) {
+    StartScheduled("1 Nov 2024 13:00");
+    RunLock other(ProgramHome::Folder());
+    ASSERT_TRUE(other.TryAcquire());
+    window->Flags().InMessage = false;
+    C().Cmd_Process[RunEngine::kProcessAll]->click();
+    ASSERT_EQ(prompter.shown.size(), 1u);
+    EXPECT_TRUE(prompter.shown[0].message.startsWith("A run is under way elsewhere"))
+        << prompter.shown[0].message.toStdString();
+    EXPECT_EQ(Last(), "never");
+    EXPECT_FALSE(window->Engine().IsBusy());
+}
+
 } // namespace
 } // namespace quorvel::testing
