@@ -2,9 +2,11 @@
 
 #include "app/app_services.h"
 #include "app/run/run_engine.h"
+#include "app/run/run_lock.h"
 #include "app/ui/route_view.h"
 #include "app/ui/window_displays.h"
 #include "app/ui/window_run.h"
+#include "app/ui/window_scheduler.h"
 #include "support/program_home.h"
 #include "support/ui/list_ops.h"
 #include "support/ui/progress_bar.h"
@@ -51,8 +53,12 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     c_.Frame_UserLocationID->installEventFilter(this);
     ftpDisplay_ = std::make_unique<FtpDisplay>(c_.Lst_Trace, c_.Lbl_status);
     services_ = std::make_unique<AppServices>();
+    runLock_ = std::make_unique<RunLock>();
     engine_ = std::make_unique<RunEngine>(*services_, *this);
+    engine_->SetRunLock(runLock_.get());
     run_ = std::make_unique<WindowRun>(*this);
+    scheduler_ = std::make_unique<WindowScheduler>(*this);
+    engine_->CalculateNextProcessDue = [this] { scheduler_->CalculateNextProcessDue(); };
     ConnectHandlers();
     InstallDropTargets();
     resize(1000, 800);
@@ -64,14 +70,15 @@ CTALUWebData& frm_WebDataClient::WebData() {
     return services_->WebData();
 }
 
-void frm_WebDataClient::Process(int which) {
-    engine_->Process(which, *run_, *run_);
+RunSummary frm_WebDataClient::Process(int which) {
+    return engine_->Process(which, *run_, *run_);
 }
 
 void frm_WebDataClient::ConnectHandlers() {
     ConnectRecordHandlers();
     ConnectWindowHandlers();
     ConnectMenus();
+    ConnectLoginHandlers();
 }
 
 void frm_WebDataClient::SetLoadedFile(const QString& path) {

@@ -3,6 +3,7 @@
 // the selected file record, the file list, the trace pane and the run buttons.
 // Loading it starts the client and closing it ends it.
 
+#include "app/account_login.h"
 #include "app/app_error.h"
 #include "app/file_list.h"
 #include "app/locations.h"
@@ -28,8 +29,11 @@ class AppServices;
 class CTALUWebData;
 class FtpDisplay;
 class RunEngine;
+class RunLock;
 class WindowRun;
+class WindowScheduler;
 struct AppSettings;
+struct RunSummary;
 struct FileRecord;
 struct TransferRules;
 
@@ -81,8 +85,22 @@ public:
     bool Initialise();
     bool ConfigureClass();
 
-    // Runs: 0 all files, 1 the file shown (RunEngine::Which).
-    void Process(int which);
+    // Login and account configuration (the steps are AccountLogin's).
+    bool GetSecureFTPDetails();
+    bool GetUserDetails();
+    bool GetFileListFromServer();
+    void Cmd_Login_Click();
+    void Cmd_GetCFG_Click();
+    void Cmd_GetFileList_Click();
+    AccountFields AccountFieldsShown() const;
+    void ShowAccountFields(const AccountFields& fields);
+
+    // Runs: 0 all files, 1 the file shown (RunEngine::Which). Nothing runs
+    // while another process on this program home runs (summary.lockHeld).
+    RunSummary Process(int which);
+    // The "Process all" and "Process file" buttons: a run, or the news that
+    // one is under way elsewhere.
+    void Cmd_Process_Click(int which);
 
     // Window states, trace and status. EnableControls derives the states
     // alone; RefreshFileStatus looks at the record's files (the local file,
@@ -137,6 +155,8 @@ public:
     // The web-data object the window owns for the whole run.
     CTALUWebData& WebData();
     RunEngine& Engine() { return *engine_; }
+    // Timer1 and the schedule labels; NextDue() is the next automatic run.
+    WindowScheduler& Scheduler() { return *scheduler_; }
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
@@ -159,6 +179,7 @@ private:
     void ConnectRecordHandlers();
     void ConnectWindowHandlers();
     void ConnectMenus();
+    void ConnectLoginHandlers();
     void InstallDropTargets();
 
     // Lifecycle details.
@@ -212,8 +233,10 @@ private:
     FileDialogs dialogs_;
     std::unique_ptr<FtpDisplay> ftpDisplay_;
     std::unique_ptr<AppServices> services_;
+    std::unique_ptr<RunLock> runLock_;
     std::unique_ptr<RunEngine> engine_;
     std::unique_ptr<WindowRun> run_;
+    std::unique_ptr<WindowScheduler> scheduler_;
 };
 
 // True when the arguments hold "/S" in any letter case.

@@ -2,6 +2,7 @@
 
 #include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
+#include "support/program_home.h"
 #include "support/run_at_startup.h"
 #include "support/shell_open.h"
 
@@ -35,7 +36,17 @@ void frm_WebDataClient::ConnectWindowHandlers() {
         connect(c_.Cmd_DoFile[i], &QPushButton::clicked, this, [this, i] { DoFile(i); });
     for (int which : {RunEngine::kProcessAll, RunEngine::kProcessFile})
         connect(c_.Cmd_Process[which], &QPushButton::clicked, this,
-                [this, which] { Process(which); });
+                [this, which] { Cmd_Process_Click(which); });
+}
+
+void frm_WebDataClient::Cmd_Process_Click(int which) {
+    if (!Process(which).lockHeld) return;
+    flags_.InMessage = true;
+    CurrentPrompter().MyMsgBox(
+        QStringLiteral("A run is under way elsewhere (another Quorvel working on %1). "
+                       "Try again when it has finished.")
+            .arg(ProgramHome::Folder()),
+        kButtonsOk | kIconExclamation);
 }
 
 void frm_WebDataClient::Chk_Trace_Click() {
