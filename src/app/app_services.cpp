@@ -96,6 +96,23 @@ void AppServices::Configure(const AccountSettings& a) {
     webData_->SetPictureBox(transferProgress_);
 }
 
+bool AppServices::FetchText(const QString& url, QString& contents) {
+    lastError_.clear();
+    if (HTTPGetFileContents(url, contents)) return true;
+    lastError_ = ftpLastError();
+    return false;
+}
+
+std::optional<UserDetails> AppServices::GetUserFolders() {
+    lastError_.clear();
+    if (!webData_->Initialise()) {
+        lastError_ = webData_->LastError();
+        return std::nullopt;
+    }
+    return UserDetails{webData_->UserName(), webData_->UserFolder(), webData_->UserCurrentFolder(),
+                       webData_->UserDataFolder()};
+}
+
 NewRecordsChannel& AppServices::NewRecords() {
     return *records_;
 }

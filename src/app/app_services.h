@@ -10,6 +10,7 @@
 //   Cancel()                                        the "Cancel" button
 //   CloseFtp()                                      when the program closes
 
+#include "app/account_login.h"
 #include "app/run/channels.h"
 #include "webdata/combo_sink.h"
 
@@ -25,7 +26,7 @@ class CTALUWebData;
 class DisplayLink;
 class ServiceSocketControl;
 
-class AppServices : public RunServices {
+class AppServices : public RunServices, public AccountService {
 public:
     AppServices();
     ~AppServices() override;
@@ -43,6 +44,13 @@ public:
     void FillDataTypes(ComboSink& combo) const;
 
     void Configure(const AccountSettings& account) override;
+
+    // The login's side: the configuration file and the file list by HTTP,
+    // the user's details from the service.
+    bool FetchText(const QString& url, QString& contents) override;
+    std::optional<UserDetails> GetUserFolders() override;
+    QString LastError() const override { return lastError_; }
+
     NewRecordsChannel& NewRecords() override;
     WholeFileChannel& WholeFiles() override;
     ProgressView* TransferProgress() override { return transferProgress_; }
@@ -73,6 +81,7 @@ private:
     std::unique_ptr<DisplayLink> displayLink_;
     std::unique_ptr<WebDataRecords> records_;
     std::unique_ptr<FtpFiles> files_;
+    QString lastError_;
 };
 
 } // namespace quorvel

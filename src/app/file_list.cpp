@@ -114,29 +114,36 @@ ListLoadResult FileList::LoadDataFile(const QString& path) {
             result.ok = false;
             result.errors.push_back({reason, QStringLiteral("LoadDataFile:") + path});
         } else {
-            Refusals refused;
-            int number = 0;
-            for (const ByteLine& line : SplitListLines(*bytes)) {
-                ++number;
-                if (line.text.size() > kMaxListLineBytes) {
-                    refused.tooLong.push_back(number);
-                    continue;
-                }
-                const bool full = Count() >= kMaxRecords;
-                if (auto error = LoadLine(line)) {
-                    if (full)
-                        ++refused.beyondLimit;
-                    else
-                        refused.overflows.push_back(*error);
-                }
-            }
-            if (auto report = refused.Report(path)) result.errors.push_back(*report);
+            result = LoadListBytes(*bytes, path);
         }
     }
     LoadedFile = path;
     // A list just read is what its file holds: nothing to write back (an
     // earlier list's changes must not make this one be rewritten at exit).
     ListChanged = false;
+    return result;
+}
+
+ListLoadResult FileList::LoadListBytes(const QByteArray& bytes, const QString& source) {
+    ListLoadResult result;
+    Clear();
+    Refusals refused;
+    int number = 0;
+    for (const ByteLine& line : SplitListLines(bytes)) {
+        ++number;
+        if (line.text.size() > kMaxListLineBytes) {
+            refused.tooLong.push_back(number);
+            continue;
+        }
+        const bool full = Count() >= kMaxRecords;
+        if (auto error = LoadLine(line)) {
+            if (full)
+                ++refused.beyondLimit;
+            else
+                refused.overflows.push_back(*error);
+        }
+    }
+    if (auto report = refused.Report(source)) result.errors.push_back(*report);
     return result;
 }
 

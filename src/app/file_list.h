@@ -56,6 +56,9 @@ public:
     // Whatever kept records out (too many, a number too large, a line too
     // long) comes back as one error that counts them, never one per line.
     ListLoadResult LoadDataFile(const QString& path);
+    // The same for a list's bytes from elsewhere (the service); source names
+    // it in the report. LoadedFile is left alone.
+    ListLoadResult LoadListBytes(const QByteArray& bytes, const QString& source);
 
     // Writes the records to LoadedFile when ListChanged is set and the
     // application and data folders exist (or could be made); otherwise the

@@ -24,8 +24,15 @@ QString RelativePart(const LocationFolders& folders, int locationId) {
     }
 }
 
+// The service gives the user folder as "/ann": joined to a folder it must
+// not make "DATA//ann", which names the same folder but no longer compares
+// equal to it (a file dropped from there would not find its location).
 QString Join(const QString& base, const QString& relative) {
-    return relative.isEmpty() ? base : AddTrailingSlash(base) + relative;
+    if (relative.isEmpty()) return base;
+    const QString folder = AddTrailingSlash(base);
+    if (!folder.isEmpty() && IsSeparator(folder.back()) && IsSeparator(relative.front()))
+        return folder + relative.mid(1);
+    return folder + relative;
 }
 
 QString ForSide(const QString& path, int which) {

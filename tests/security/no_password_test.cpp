@@ -5,6 +5,9 @@
 #include "ftps_peer.h"
 #include "security_fixture.h"
 
+#include "common/command_line_process.h"
+#include "common/reference_service.h"
+#include "support/ini_store.h"
 #include "transfer/ftp.h"
 
 #include <QDir>
@@ -144,6 +147,57 @@ TEST_F(TlsServiceTest, NoOutputEverShowsAPassword) {
     EXPECT_TRUE(outputs.value(QStringLiteral("FTP traces")).contains(QStringLiteral("Getting: ")));
     EXPECT_TRUE(outputs.value(QStringLiteral("ftp.log")).contains(QStringLiteral("site1.dat")));
     EXPECT_TRUE(outputs.value(QStringLiteral("program log")).contains(QStringLiteral("S>GET")));
+    for (auto it = outputs.begin(); it != outputs.end(); ++it) {
+        SCOPED_TRACE(it.key().toStdString());
+        for (const QString& secret : {QStringLiteral("Tr0ub"), QStringLiteral("Pw-9ftp")})
+            EXPECT_FALSE(it.value().contains(secret)) << it.value().toStdString();
+    }
+}
+
+// The command-line run, as cron would see it: what it prints, what it writes
+// to standard error and to its logs, over a good run, a failed file, a
+// refused login and a dry run.
+TEST(CommandLineRunPasswords, NoOutputOfTheCommandLineRunShowsAPassword) {
+    TempHome home;
+    ReferenceService service;
+    ASSERT_TRUE(service.AddUser({.name = QStringLiteral("ann"),
+                                 .password = QStringLiteral("Tr0ub-cli&pw d"),
+                                 .ftpPassword = QStringLiteral("Pw-9ftp-cli")}))
+        << service.LastError().toStdString();
+    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("site1.dat"),
+                      "2024-11-01 10:00:00,1\r\n");
+    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("files.txt"),
+                      " 1 ~1~Site~site1.dat~1~2~1~1~0~1~0~~~0\r\n"
+                      " 2 ~1~Whole~site1.dat~0~2~1~0~0~1~0~~~0\r\n"
+                      " 3 ~1~Gone~gone.dat~0~2~1~0~0~1~0~~~0\r\n");
+    ASSERT_TRUE(service.Start()) << service.LastError().toStdString();
+    LocalSettings settings(home.File(QStringLiteral("quorvel.ini")));
+    settings.SaveLocalSetting(QStringLiteral("CFG_URL"), service.CfgUrl(QStringLiteral("ann")));
+    settings.SaveLocalSetting(QStringLiteral("UserID"), QStringLiteral("ann"));
+    settings.SaveLocalSetting(QStringLiteral("Password"), QStringLiteral("Tr0ub-cli&pw d"));
+    settings.SaveLocalSetting(QStringLiteral("DataFolder"), home.File(QStringLiteral("data")));
+
+    CommandLineProcess cli(home.Path());
+    QStringList printed;
+    const auto good = cli.Run({QStringLiteral("--run-all")});
+    EXPECT_EQ(good.code, 1) << good.err.toStdString(); // gone.dat fails
+    printed << good.out << good.err;
+    const auto dry = cli.Run({QStringLiteral("--run-all"), QStringLiteral("--dry-run")});
+    printed << dry.out << dry.err;
+    settings.SaveLocalSetting(QStringLiteral("Password"), QStringLiteral("Tr0ub-cli&pw wrong"));
+    const auto refused = cli.Run({QStringLiteral("--run-all")});
+    EXPECT_EQ(refused.code, 2);
+    printed << refused.out << refused.err;
+
+    const QMap<QString, QString> outputs{
+        {QStringLiteral("standard output and error"), printed.join(QLatin1Char('\n'))},
+        {QStringLiteral("program log"), ReadFile(home.File(QStringLiteral("quorvel.log")))},
+        {QStringLiteral("ftp.log"), ReadFile(home.File(QStringLiteral("ftp.log")))},
+    };
+    const QString printedText = outputs.value(QStringLiteral("standard output and error"));
+    EXPECT_TRUE(printedText.contains(QStringLiteral("Login failed"))) << printedText.toStdString();
+    EXPECT_TRUE(printedText.contains(QStringLiteral("[3/3] Gone: failed")));
+    EXPECT_TRUE(outputs.value(QStringLiteral("ftp.log")).contains(QStringLiteral("site1.dat")));
     for (auto it = outputs.begin(); it != outputs.end(); ++it) {
         SCOPED_TRACE(it.key().toStdString());
         for (const QString& secret : {QStringLiteral("Tr0ub"), QStringLiteral("Pw-9ftp")})

@@ -7,6 +7,8 @@
 #include "transfer/zip_codes.h"
 #include "transfer/zip_steps.h"
 
+#include <QFileInfo>
+
 namespace quorvel {
 
 namespace {
@@ -33,52 +35,86 @@ bool FileProcessor::Fail(FileOutcome& out, const QString& reason) {
     return false;
 }
 
-FileOutcome FileProcessor::Process(const FileRecord& record, const RunSettings& settings) {
-    FileOutcome out;
-    out.record = record;
+FilePlan FileProcessor::Locate(const FileRecord& record, const RunSettings& settings) const {
+    FilePlan p;
     const LocationFolders folders = FoldersFor(settings, record);
     if (!CheckUserFolders(folders)) {
-        // The folder check has shown which folder it could not make.
-        Fail(out, QStringLiteral("The user folders could not be made"));
-        out.showReason = false;
-        return out;
+        p.kind = FilePlan::kNoUserFolders;
+        return p;
     }
     if (IsCommandRecord(record, "FROMDATE")) {
-        out.fromDateChoice = IsDateText(record.FileName) ? 1 : 0;
-        out.afterDate = record.FileName;
-        return out;
+        p.kind = FilePlan::kFromDate;
+        return p;
     }
     const LocationPath local = ProcessFilename(folders, record.FileName, record.UserLocationID,
                                                record.AdminLocationID, false, kOnThisPc);
     const LocationPath remote = ProcessFilename(folders, record.FileName, record.UserLocationID,
                                                 record.AdminLocationID, false, kAtService);
     if (!local.ok() || !remote.ok()) {
-        Fail(out, local.ok() ? remote.refusal : local.refusal);
-        return out;
+        p.kind = FilePlan::kRefused;
+        p.refusal = local.ok() ? remote.refusal : local.refusal;
+        return p;
     }
-    if (IsCommandRecord(record, "DIR")) {
-        if (auto error = GenerateAllFiles(local.path, folders, NowValue())) report_(*error);
-    }
+    if (IsCommandRecord(record, "DIR")) p.kind = FilePlan::kDirectory;
+    p.local = local.path;
+    p.remote = remote.path;
+    return p;
+}
 
+void FileProcessor::Decide(FilePlan& p, const FileRecord& record, const RunSettings& settings) {
     const TransferRules rules = RulesOf(record);
-    TransferFacts facts;
-    facts.downloadOnly = settings.downloadOnly;
-    facts.localExists = FileExists(local.path);
-    facts.listDay = DayFromText(record.FileDate);
-    facts.localDay = DayFromText(record.FileDateLocal);
+    p.facts.downloadOnly = settings.downloadOnly;
+    p.facts.localExists = FileExists(p.local);
+    p.facts.listDay = DayFromText(record.FileDate);
+    p.facts.localDay = DayFromText(record.FileDateLocal);
     if (NeedsRemoteCheck(rules, settings.downloadOnly)) {
-        facts.remoteExists = services_.WholeFiles().RemoteFileExists(
-            rules.zip ? ZipFileName(remote.path) : remote.path);
+        p.facts.remoteExists =
+            services_.WholeFiles().RemoteFileExists(rules.zip ? ZipFileName(p.remote) : p.remote);
     }
-    const TransferPlan plan = DecideTransfers(rules, facts);
-    if (plan.newerListDate) {
-        trace_.AddTrace(QStringLiteral("Downloading: ") + remote.path +
+    p.plan = DecideTransfers(rules, p.facts);
+}
+
+FilePlan FileProcessor::Plan(const FileRecord& record, const RunSettings& settings) {
+    FilePlan p = Locate(record, settings);
+    if (p.kind == FilePlan::kTransfer || p.kind == FilePlan::kDirectory)
+        Decide(p, record, settings);
+    return p;
+}
+
+FileOutcome FileProcessor::Process(const FileRecord& record, const RunSettings& settings) {
+    FileOutcome out;
+    out.record = record;
+    FilePlan p = Locate(record, settings);
+    switch (p.kind) {
+    case FilePlan::kNoUserFolders:
+        // The folder check has shown which folder it could not make.
+        Fail(out, QStringLiteral("The user folders could not be made"));
+        out.showReason = false;
+        return out;
+    case FilePlan::kFromDate:
+        out.fromDateChoice = IsDateText(record.FileName) ? 1 : 0;
+        out.afterDate = record.FileName;
+        return out;
+    case FilePlan::kRefused:
+        Fail(out, p.refusal);
+        return out;
+    case FilePlan::kDirectory:
+        // Written before the decision, so that an upload of it finds it.
+        if (auto error = GenerateAllFiles(p.local, FoldersFor(settings, record), NowValue()))
+            report_(*error);
+        break;
+    case FilePlan::kTransfer:
+        break;
+    }
+    Decide(p, record, settings);
+    if (p.plan.newerListDate) {
+        trace_.AddTrace(QStringLiteral("Downloading: ") + p.remote +
                         QStringLiteral(" because new date: ") + record.FileDate +
                         QStringLiteral(" Local:") + record.FileDateLocal);
     }
-    if (plan.download && !Download(record, local.path, remote.path, plan.downloadMethod, out))
+    if (p.plan.download && !Download(record, p.local, p.remote, p.plan.downloadMethod, out))
         return out;
-    if (plan.upload) Upload(record, local.path, remote.path, plan.uploadMethod, out);
+    if (p.plan.upload) Upload(record, p.local, p.remote, p.plan.uploadMethod, out);
     return out;
 }
 
@@ -86,6 +122,9 @@ bool FileProcessor::Download(const FileRecord& record, const QString& local, con
                              int method, FileOutcome& out) {
     const QString localFile = record.Zip ? ZipFileName(local) : local;
     const QString remoteFile = record.Zip ? ZipFileName(remote) : remote;
+    out.downloadedFile = localFile;
+    out.sizeBefore = FileExists(localFile) ? QFileInfo(localFile).size() : -1;
+    out.newRecords = method == kMethodOnlyNewData;
     if (method == kMethodOnlyNewData) {
         NewRecordsChannel& channel = services_.NewRecords();
         if (!channel.GetNewData(localFile, record.UserLocationID, record.TypeID))
@@ -124,6 +163,7 @@ bool FileProcessor::Upload(const FileRecord& record, const QString& local, const
         if (!channel.Upload(localFile, remoteFile)) return Fail(out, channel.LastError());
     }
     out.uploaded = true;
+    out.uploadedFile = localFile;
     return true;
 }
 

@@ -4,10 +4,21 @@
 
 #include "app/run/channels.h"
 #include "app/run/run_host.h"
+#include "app/run/transfer_decision.h"
 
 #include <functional>
 
 namespace quorvel {
+
+// What a run would do with one record, decided before anything moves.
+struct FilePlan {
+    enum Kind { kTransfer, kFromDate, kDirectory, kRefused, kNoUserFolders };
+    Kind kind = kTransfer;
+    QString local, remote; // the record's paths (before any zip renaming)
+    QString refusal;       // why a path was refused
+    TransferFacts facts;
+    TransferPlan plan;
+};
 
 class FileProcessor {
 public:
@@ -19,8 +30,15 @@ public:
 
     // The record is taken as the fields show it (AsShownInFields).
     FileOutcome Process(const FileRecord& record, const RunSettings& settings);
+    // The decision alone: folders are checked (and made) but nothing is
+    // written or sent. Asks the service only whether a file is there, for
+    // upload "Once".
+    FilePlan Plan(const FileRecord& record, const RunSettings& settings);
 
 private:
+    // The folder check, the command records and the paths.
+    FilePlan Locate(const FileRecord& record, const RunSettings& settings) const;
+    void Decide(FilePlan& plan, const FileRecord& record, const RunSettings& settings);
     bool Download(const FileRecord& record, const QString& local, const QString& remote, int method,
                   FileOutcome& out);
     bool Upload(const FileRecord& record, const QString& local, const QString& remote, int method,

@@ -1,5 +1,6 @@
 #include "app/run/run_engine.h"
 
+#include "app/run/run_lock.h"
 #include "app/run/run_prompter.h"
 #include "app/run/transfer_decision.h"
 #include "support/date_value.h"
@@ -36,6 +37,11 @@ void RunEngine::ShowError(const AppError& error) {
 RunSummary RunEngine::Process(int which, RunHost& host, RunObserver& observer) {
     RunSummary summary;
     if (busy_) return summary;
+    const RunLockHold lock(runLock_);
+    if (!lock.Held()) {
+        summary.lockHeld = true;
+        return summary;
+    }
     BusyGuard pointer(CurrentBusyPointer());
     RunPromptScope prompts([&observer] { observer.MessageShown(); });
     busy_ = true;

@@ -14,9 +14,12 @@
 
 namespace quorvel {
 
+class RunLock;
+
 struct RunSummary {
-    bool ran = false;  // false: a run was under way already, or the folders were unusable
-    int processed = 0; // active entries taken up
+    bool ran = false;      // false: a run was under way already, or the folders were unusable
+    bool lockHeld = false; // another process holds the run lock: nothing was done
+    int processed = 0;     // active entries taken up
     int failed = 0;
     bool cancelled = false;
 };
@@ -28,8 +31,12 @@ public:
     // status: "Processed n file(s)" and the engine's trace lines.
     RunEngine(RunServices& services, TraceView& status);
 
-    // A call while a run is under way (a timer tick, a second click) does nothing.
+    // A call while a run is under way (a timer tick, a second click) does
+    // nothing; so does a call while another process holds the run lock.
     RunSummary Process(int which, RunHost& host, RunObserver& observer);
+
+    // The program home's run lock, held for every run; none by default.
+    void SetRunLock(RunLock* lock) { runLock_ = lock; }
 
     bool IsBusy() const { return busy_; }
     bool CancelRequested() const { return cancelRequested_; }
@@ -56,6 +63,7 @@ private:
     RunServices& services_;
     TraceView& status_;
     FileProcessor processor_;
+    RunLock* runLock_ = nullptr;
     bool busy_ = false;
     bool cancelRequested_ = false;
     QString lastErrorText_;

@@ -21,6 +21,7 @@
 
 #include <QString>
 
+#include <cstdint>
 #include <optional>
 
 namespace quorvel {
@@ -36,6 +37,13 @@ struct FileOutcome {
     // A "FROMDATE" record: the "Download which dates" choice for the files after it.
     std::optional<int> fromDateChoice;
     QString afterDate;
+    // What moved, for a report of the run: the local file a download wrote
+    // (its size before, -1 when there was none; newRecords when only new
+    // records were asked for) and the file an upload sent.
+    QString downloadedFile;
+    std::int64_t sizeBefore = -1;
+    bool newRecords = false;
+    QString uploadedFile;
 };
 
 class RunHost {

@@ -10,7 +10,8 @@ Ports WithPrompter(Prompter* prompter) {
     return ports;
 }
 
-// The answer of a box that nobody should have to answer during a run.
+} // namespace
+
 int QuietAnswer(int buttons) {
     switch (buttons & 7) {
     case kButtonsYesNo:
@@ -23,8 +24,6 @@ int QuietAnswer(int buttons) {
         return kAnswerOk;
     }
 }
-
-} // namespace
 
 int RunPrompter::MyMsgBox(const QString& message, int buttons) {
     if (beforeBox_) beforeBox_();

@@ -10,6 +10,10 @@
 
 namespace quorvel {
 
+// The answer of a waiting box that nobody is to answer: "No" where it asks,
+// "Cancel" where it offers that, else OK.
+int QuietAnswer(int buttons);
+
 class RunPrompter : public Prompter {
 public:
     // beforeBox runs before every box (the window notes that a box was shown).

@@ -2,10 +2,12 @@
 
 #include "app/app_services.h"
 #include "app/run/run_engine.h"
+#include "app/run/run_lock.h"
 #include "app/ui/desktop_identity.h"
 #include "app/ui/route_view.h"
 #include "app/ui/window_displays.h"
 #include "app/ui/window_run.h"
+#include "app/ui/window_scheduler.h"
 #include "support/program_home.h"
 #include "support/ui/list_ops.h"
 #include "support/ui/progress_bar.h"
@@ -70,9 +72,14 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     c_.Frame_UserLocationID->installEventFilter(this);
     ftpDisplay_ = std::make_unique<FtpDisplay>(c_.Lst_Trace, c_.Lbl_status);
     services_ = std::make_unique<AppServices>();
+    runLock_ = std::make_unique<RunLock>();
     engine_ = std::make_unique<RunEngine>(*services_, *this);
+    engine_->SetRunLock(runLock_.get());
     run_ = std::make_unique<WindowRun>(*this);
+    scheduler_ = std::make_unique<WindowScheduler>(*this);
+    engine_->CalculateNextProcessDue = [this] { scheduler_->CalculateNextProcessDue(); };
     ConnectHandlers();
+    ConnectSessionEnd();
     InstallDropTargets();
     setMinimumSize(760, 540); // below this the editor has no room left to work in
     resize(FirstSize());
@@ -84,19 +91,21 @@ CTALUWebData& frm_WebDataClient::WebData() {
     return services_->WebData();
 }
 
-void frm_WebDataClient::Process(int which) {
-    // A command never starts while another one waits for its reply.
+RunSummary frm_WebDataClient::Process(int which) {
+    // A command never starts while another one waits for its reply: the run
+    // starts when the wait is over.
     if (refreshing_) {
         processAfterRefresh_ = which;
-        return;
+        return {};
     }
-    engine_->Process(which, *run_, *run_);
+    return engine_->Process(which, *run_, *run_);
 }
 
 void frm_WebDataClient::ConnectHandlers() {
     ConnectRecordHandlers();
     ConnectWindowHandlers();
     ConnectMenus();
+    ConnectLoginHandlers();
 }
 
 void frm_WebDataClient::SetLoadedFile(const QString& path) {

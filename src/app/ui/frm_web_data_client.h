@@ -3,6 +3,7 @@
 // the selected file record, the file list, the trace pane and the run buttons.
 // Loading it starts the client and closing it ends it.
 
+#include "app/account_login.h"
 #include "app/app_error.h"
 #include "app/file_list.h"
 #include "app/locations.h"
@@ -28,8 +29,11 @@ class AppServices;
 class CTALUWebData;
 class FtpDisplay;
 class RunEngine;
+class RunLock;
 class WindowRun;
+class WindowScheduler;
 struct AppSettings;
+struct RunSummary;
 struct FileRecord;
 struct TransferRules;
 
@@ -86,8 +90,22 @@ public:
     bool Initialise();
     bool ConfigureClass();
 
-    // Runs: 0 all files, 1 the file shown (RunEngine::Which).
-    void Process(int which);
+    // Login and account configuration (the steps are AccountLogin's).
+    bool GetSecureFTPDetails();
+    bool GetUserDetails();
+    bool GetFileListFromServer();
+    void Cmd_Login_Click();
+    void Cmd_GetCFG_Click();
+    void Cmd_GetFileList_Click();
+    AccountFields AccountFieldsShown() const;
+    void ShowAccountFields(const AccountFields& fields);
+
+    // Runs: 0 all files, 1 the file shown (RunEngine::Which). Nothing runs
+    // while another process on this program home runs (summary.lockHeld).
+    RunSummary Process(int which);
+    // The "Process all" and "Process file" buttons: a run, or the news that
+    // one is under way elsewhere.
+    void Cmd_Process_Click(int which);
 
     // Window states, trace and status. EnableControls derives the states
     // alone; RefreshFileStatus looks at the record's files (the local file,
@@ -111,9 +129,10 @@ public:
     // nothing is unsaved, or it was saved, or the user let it go. Asks Save /
     // Discard / Cancel; an unattended window saves without asking.
     bool ConfirmUnsavedList();
-    // Writes the list to its file, asking for a name when it has none; false
-    // when it was not written (cancelled or failed, after the report).
-    bool SaveListNow();
+    // Writes the list to its file, asking for a name when it has none (and
+    // mayAsk); false when it was not written (cancelled or failed, after the
+    // report).
+    bool SaveListNow(bool mayAsk = true);
     // Writes the list when it changed; the error instead of a report.
     std::optional<AppError> SaveChangedList();
     bool StoreCurrentRecord();
@@ -154,6 +173,8 @@ public:
     // The web-data object the window owns for the whole run.
     CTALUWebData& WebData();
     RunEngine& Engine() { return *engine_; }
+    // Timer1 and the schedule labels; NextDue() is the next automatic run.
+    WindowScheduler& Scheduler() { return *scheduler_; }
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
@@ -182,6 +203,7 @@ private:
     void ConnectRecordHandlers();
     void ConnectWindowHandlers();
     void ConnectMenus();
+    void ConnectLoginHandlers();
     void InstallDropTargets();
 
     // Lifecycle details.
@@ -197,6 +219,7 @@ private:
     // Where an unattended window puts a list that has no file (or whose file
     // cannot be written), so that it is never dropped.
     bool RescueList();
+    void ConnectSessionEnd();
     void Form_Unload();
     void NoteActivation(QEvent* event);
 
@@ -252,8 +275,10 @@ private:
     FileDialogs dialogs_;
     std::unique_ptr<FtpDisplay> ftpDisplay_;
     std::unique_ptr<AppServices> services_;
+    std::unique_ptr<RunLock> runLock_;
     std::unique_ptr<RunEngine> engine_;
     std::unique_ptr<WindowRun> run_;
+    std::unique_ptr<WindowScheduler> scheduler_;
 };
 
 // True when the arguments hold "/S" in any letter case.

@@ -37,7 +37,7 @@ void frm_WebDataClient::ConnectWindowHandlers() {
         connect(c_.Cmd_DoFile[i], &QPushButton::clicked, this, [this, i] { DoFile(i); });
     for (int which : {RunEngine::kProcessAll, RunEngine::kProcessFile})
         connect(c_.Cmd_Process[which], &QPushButton::clicked, this,
-                [this, which] { Process(which); });
+                [this, which] { Cmd_Process_Click(which); });
     // The Delete key on the list does what the "Delete" button does, when it may.
     auto* remove =
         new QShortcut(QKeySequence::Delete, c_.Lst_Files, nullptr, nullptr, Qt::WidgetShortcut);
@@ -51,6 +51,16 @@ QStringList frm_WebDataClient::StartupArguments() {
     QStringList arguments{QStringLiteral("/S")};
     if (!ProgramHome::IsDefault()) arguments << QStringLiteral("--home") << ProgramHome::Folder();
     return arguments;
+}
+
+void frm_WebDataClient::Cmd_Process_Click(int which) {
+    if (!Process(which).lockHeld) return;
+    flags_.InMessage = true;
+    CurrentPrompter().MyMsgBox(
+        QStringLiteral("A run is under way elsewhere (another Quorvel working on %1). "
+                       "Try again when it has finished.")
+            .arg(ProgramHome::Folder()),
+        kButtonsOk | kIconExclamation);
 }
 
 void frm_WebDataClient::Chk_Trace_Click() {

@@ -5,6 +5,7 @@
 #include "app/run/run_engine.h"
 #include "app/ui/frm_web_data_client.h"
 #include "app/ui/window_displays.h"
+#include "app/ui/window_scheduler.h"
 #include "support/date_value.h"
 #include "support/program_home.h"
 #include "support/run_at_startup.h"
@@ -52,6 +53,7 @@ void SetBackground(QWidget* widget, const QColor& colour) {
 
 void frm_WebDataClient::Form_Load() {
     flags_.IsLoading = true;
+    scheduler_->Start();
     if (scheduledStart_) setWindowState(windowState() | Qt::WindowMinimized);
     services_->SetViews(this, ftpDisplay_.get(), c_.Pic_ProgressFTP);
     ComboBoxSink intervals(c_.Cmb_interval);
@@ -132,20 +134,18 @@ void frm_WebDataClient::Form_Activate() {
     flags_.InMessage = false;
 }
 
-bool frm_WebDataClient::AccountSteps(bool& listFromService) {
-    // The login steps go here: the configuration file, the user's details from
-    // the service and, when the administrator keeps the file list, the user's
-    // list from the service. Until they exist there is no account to sign in
-    // to, so the list named by the first recent entry is used.
-    listFromService = false;
-    return true;
-}
-
 bool frm_WebDataClient::Initialise() {
     BusyGuard busy(CurrentBusyPointer());
     bool listFromService = false;
-    if (!AccountSteps(listFromService)) return false;
-    if (!listFromService && !OpenFileList(recent_.Entry(1))) return false;
+    const bool signedIn = AccountSteps(listFromService);
+    // When the service cannot be reached (offline, no account yet) the list on
+    // this PC still opens: the user's own list, or at start-up the copy of the
+    // service's list saved by the last session. The failed step's reason stays
+    // in the status line.
+    const bool ownList = c_.Opt_GetLocalFolders->SelectedIndex() != 1;
+    const bool openLocal = signedIn ? !listFromService : ownList || files_.Count() == 0;
+    if (openLocal && !OpenFileList(recent_.Entry(1))) return false;
+    if (!signedIn) return false;
     ShowStatus(QString());
     return true;
 }

@@ -4,9 +4,10 @@
 
 namespace quorvel {
 
-WindowPorts::WindowPorts(QWidget* owner) : prompter_(owner) {
+WindowPorts::WindowPorts(QWidget* owner, bool unattended)
+    : prompter_(owner), unattended_(&prompter_) {
     Ports ports;
-    ports.prompter = &prompter_;
+    ports.prompter = unattended ? static_cast<Prompter*>(&unattended_) : &prompter_;
     ports.busy = &busy_;
     ports.clock = &clock_;
     scope_ = std::make_unique<ScopedPorts>(ports);

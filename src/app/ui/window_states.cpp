@@ -121,7 +121,8 @@ void frm_WebDataClient::RefreshFileStatus() {
         RefreshFileStatusOnce();
     } while (refreshAgain_);
     refreshing_ = false;
-    if (const auto which = std::exchange(processAfterRefresh_, std::nullopt)) Process(*which);
+    if (const auto which = std::exchange(processAfterRefresh_, std::nullopt))
+        Cmd_Process_Click(*which);
 }
 
 void frm_WebDataClient::RefreshFileStatusOnce() {

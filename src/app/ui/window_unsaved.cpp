@@ -9,7 +9,9 @@
 #include <QDateTime>
 #include <QDir>
 #include <QFileInfo>
+#include <QGuiApplication>
 #include <QMessageBox>
+#include <QSessionManager>
 
 namespace quorvel {
 
@@ -19,11 +21,23 @@ const QString kListFilter = QStringLiteral("files.txt (file*.txt);;All files (*)
 
 } // namespace
 
+void frm_WebDataClient::ConnectSessionEnd() {
+    // The desktop session ends: nobody will answer a question, and the list
+    // must not be lost with the session.
+    connect(qApp, &QGuiApplication::commitDataRequest, this, [this](QSessionManager&) {
+        sessionEnding_ = true;
+        ConfirmUnsavedList();
+        sessionEnding_ = false;
+    });
+}
+
 bool frm_WebDataClient::ConfirmUnsavedList() {
     if (!files_.ListChanged && !flags_.RecordEdited) return true;
-    if (Unattended()) {
-        // Nobody may be there to answer, and saving loses nothing.
-        if (SaveListNow()) return true;
+    // Nobody may be there to answer, and saving loses nothing; a list the
+    // administrator keeps came from the service, not from an edit, and is
+    // written back as it always was.
+    if (Unattended() || !FileListFromUser()) {
+        if (SaveListNow(false)) return true;
         return RescueList();
     }
     const QString name =
@@ -40,13 +54,13 @@ bool frm_WebDataClient::ConfirmUnsavedList() {
     }
 }
 
-bool frm_WebDataClient::SaveListNow() {
+bool frm_WebDataClient::SaveListNow(bool mayAsk) {
     StoreCurrentRecord();
     QString path = files_.LoadedFile;
     std::optional<AppError> error;
     if (path.isEmpty()) {
         // A new list has no file yet: it gets one rather than being dropped.
-        if (Unattended()) return false;
+        if (!mayAsk) return false;
         const QString chosen = dialogs_.saveFile(this, QStringLiteral("Save file list"),
                                                  c_.Txt_LocalFolder[0]->text(), kListFilter);
         if (chosen.isEmpty()) return false;
