@@ -8,6 +8,7 @@
 #include "app/ui/window_displays.h"
 #include "app/ui/window_run.h"
 #include "app/ui/window_scheduler.h"
+#include "app/ui/window_tray.h"
 #include "support/program_home.h"
 #include "support/ui/list_ops.h"
 #include "support/ui/progress_bar.h"
@@ -78,6 +79,7 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     run_ = std::make_unique<WindowRun>(*this);
     scheduler_ = std::make_unique<WindowScheduler>(*this);
     engine_->CalculateNextProcessDue = [this] { scheduler_->CalculateNextProcessDue(); };
+    tray_ = std::make_unique<WindowTray>(*this, *scheduler_);
     ConnectHandlers();
     ConnectSessionEnd();
     InstallDropTargets();

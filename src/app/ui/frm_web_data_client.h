@@ -31,6 +31,7 @@ class FtpDisplay;
 class RunEngine;
 class RunLock;
 class WindowRun;
+class WindowTray;
 class WindowScheduler;
 struct AppSettings;
 struct RunSummary;
@@ -175,6 +176,7 @@ public:
     RunEngine& Engine() { return *engine_; }
     // Timer1 and the schedule labels; NextDue() is the next automatic run.
     WindowScheduler& Scheduler() { return *scheduler_; }
+    WindowTray& Tray() { return *tray_; }
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
@@ -279,6 +281,7 @@ private:
     std::unique_ptr<RunEngine> engine_;
     std::unique_ptr<WindowRun> run_;
     std::unique_ptr<WindowScheduler> scheduler_;
+    std::unique_ptr<WindowTray> tray_;
 };
 
 // True when the arguments hold "/S" in any letter case.

@@ -6,6 +6,7 @@
 #include "app/ui/frm_web_data_client.h"
 #include "app/ui/window_displays.h"
 #include "app/ui/window_scheduler.h"
+#include "app/ui/window_tray.h"
 #include "support/date_value.h"
 #include "support/program_home.h"
 #include "support/run_at_startup.h"
@@ -82,6 +83,7 @@ void frm_WebDataClient::Form_Load() {
     setWindowTitle(QString::fromLatin1(kApplicationTitle));
     EnableControls();
     RefreshFileStatus();
+    tray_->Refresh();
     flags_.IsLoading = false;
 }
 
@@ -182,6 +184,11 @@ void frm_WebDataClient::Form_Unload() {
 }
 
 void frm_WebDataClient::closeEvent(QCloseEvent* event) {
+    if (tray_->KeepRunningOnClose()) {
+        hide();
+        event->ignore();
+        return;
+    }
     bool cancel = false;
     Form_QueryUnload(cancel);
     if (cancel) {

@@ -2,6 +2,7 @@
 // list replaces it, and before the window closes, the user chooses Save,
 // Discard or Cancel. An unattended window cannot ask, so it saves.
 
+#include "app/app_settings.h"
 #include "app/ui/frm_web_data_client.h"
 #include "support/log_file.h"
 #include "support/program_home.h"
@@ -24,9 +25,11 @@ const QString kListFilter = QStringLiteral("files.txt (file*.txt);;All files (*)
 void frm_WebDataClient::ConnectSessionEnd() {
     // The desktop session ends: nobody will answer a question, and the list
     // must not be lost with the session.
+    // The settings are written too: a program in the tray is never closed.
     connect(qApp, &QGuiApplication::commitDataRequest, this, [this](QSessionManager&) {
         sessionEnding_ = true;
         ConfirmUnsavedList();
+        CurrentSettings().Save(settings_);
         sessionEnding_ = false;
     });
 }
