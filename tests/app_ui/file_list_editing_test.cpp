@@ -3,11 +3,14 @@
 
 #include "window_fixture.h"
 
+#include "app/run/run_engine.h"
 #include "support/program_home.h"
 
 #include <QApplication>
+#include <QDir>
 #include <QDropEvent>
 #include <QFile>
+#include <QFileInfo>
 #include <QMessageBox>
 #include <QMimeData>
 #include <QTest>
@@ -308,6 +311,12 @@ TEST_F(MenusTest, ClosingWithANewListAsksForItsNameAndStaysOpenWithoutOne) {
         C().mnu_File[0]->trigger();
         AnswerDialogs({home.File("new.csv")});
         C().Cmd_DoFile[kFileNew]->click();
+        // A run writes the list when it ends; without a name it waits for one.
+        ports.prompter.Script(kAnswerOk);
+        C().Cmd_Process[RunEngine::kProcessAll]->click();
+        for (const auto& box : ports.prompter.shown)
+            EXPECT_FALSE(box.message.contains("No file name")) << box.message.toStdString();
+        ports.prompter.shown.clear();
         unsavedAsked.clear();
         AnswerUnsaved({QMessageBox::Save});
         AnswerDialogs(named ? QStringList({home.File("season.txt")}) : QStringList());
@@ -328,6 +337,21 @@ TEST_F(MenusTest, ClosingWithANewListAsksForItsNameAndStaysOpenWithoutOne) {
         }
         Close();
     }
+}
+
+// Started with "/S" nobody may be there to answer: the close saves without a
+// question, and a list without a name goes to a file of its own in the home.
+TEST_F(MenusTest, AnUnattendedCloseSavesWithoutAskingAndNeverDropsANewList) {
+    Start({"/S"});
+    C().mnu_File[0]->trigger();
+    AnswerDialogs({home.File("new.csv")});
+    C().Cmd_DoFile[kFileNew]->click();
+    EXPECT_TRUE(window->close());
+    EXPECT_TRUE(unsavedAsked.isEmpty());
+    const QStringList rescued = QDir(home.Path()).entryList({"files-unsaved-*.txt"});
+    ASSERT_EQ(rescued.size(), 1);
+    EXPECT_TRUE(home.Read(rescued[0]).contains("~new.csv~new.csv~"));
+    EXPECT_TRUE(home.Read(QFileInfo(ProgramHome::LogFile()).fileName()).contains(rescued[0].toUtf8()));
 }
 
 // File > Save writes the list to its own file; the keys of the File menu and

@@ -69,6 +69,9 @@ bool frm_WebDataClient::OpenFileList(const QString& path) {
 }
 
 std::optional<AppError> frm_WebDataClient::SaveChangedList() {
+    // A new list has no file yet: it waits for the name the user is asked
+    // for when it is replaced or the window closes, instead of failing here.
+    if (files_.LoadedFile.isEmpty()) return std::nullopt;
     return files_.SaveFileList(Folders());
 }
 
