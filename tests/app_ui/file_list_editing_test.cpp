@@ -351,7 +351,8 @@ TEST_F(MenusTest, AnUnattendedCloseSavesWithoutAskingAndNeverDropsANewList) {
     const QStringList rescued = QDir(home.Path()).entryList({"files-unsaved-*.txt"});
     ASSERT_EQ(rescued.size(), 1);
     EXPECT_TRUE(home.Read(rescued[0]).contains("~new.csv~new.csv~"));
-    EXPECT_TRUE(home.Read(QFileInfo(ProgramHome::LogFile()).fileName()).contains(rescued[0].toUtf8()));
+    EXPECT_TRUE(
+        home.Read(QFileInfo(ProgramHome::LogFile()).fileName()).contains(rescued[0].toUtf8()));
 }
 
 // File > Save writes the list to its own file; the keys of the File menu and

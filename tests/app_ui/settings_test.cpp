@@ -56,6 +56,10 @@ TEST_F(SettingsTest, AFirstStartSaysWhatToDoNext) {
                 count += QColor(image.pixel(x, y)) != back ? 1 : 0;
         return count;
     };
+    // Nothing to sign in with yet: no fetch from an empty address, but the way there.
+    EXPECT_TRUE(C().Lbl_status->text().startsWith("Welcome to Quorvel: enter the CFG file"))
+        << C().Lbl_status->text().toStdString();
+    EXPECT_TRUE(ports.prompter.shown.empty());
     EXPECT_TRUE(C().Lst_Files->EmptyHint().contains("Log in on the Main tab"));
     EXPECT_GT(hintPixels(), 0);
     C().Opt_GetFileList->Button(0)->click();

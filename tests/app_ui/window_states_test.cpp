@@ -182,6 +182,11 @@ TEST_F(WindowStatesTest, TraceAndWebDataEventsReachStatusAndTraceOneLinePerLine)
         EXPECT_EQ(C().Lst_Trace->item(i)->text(), expected[i]);
     C().Cmd_Clear->click();
     EXPECT_EQ(C().Lst_Trace->count(), 0);
+    // The status label is one line high: a reason of two lines is shown whole on it.
+    window->ShowStatus("Could not connect to http://\nURL using bad/illegal format\r\n");
+    EXPECT_EQ(C().Lbl_status->text(),
+              "Could not connect to http:// \u2014 URL using bad/illegal format");
+    EXPECT_EQ(C().Lst_Trace->count(), 3);
 }
 
 TEST_F(WindowStatesTest, FtpTraceFollowsTraceAloneAndItsStatusGoesToTheLabel) {

@@ -139,7 +139,13 @@ void frm_WebDataClient::Form_Activate() {
 bool frm_WebDataClient::Initialise() {
     BusyGuard busy(CurrentBusyPointer());
     bool listFromService = false;
-    const bool signedIn = AccountSteps(listFromService);
+    // Nothing to sign in with yet (a first start): the way there, not the
+    // failure of a fetch from an empty address.
+    const bool configured = !c_.Txt_CFG_URL->text().trimmed().isEmpty();
+    const bool signedIn = configured && AccountSteps(listFromService);
+    if (!configured)
+        ShowStatus(QStringLiteral("Welcome to Quorvel: enter the CFG file web address, your user "
+                                  "ID and password on the Main tab, then press Login."));
     // When the service cannot be reached (offline, no account yet) the list on
     // this PC still opens: the user's own list, or at start-up the copy of the
     // service's list saved by the last session. The failed step's reason stays

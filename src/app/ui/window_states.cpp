@@ -14,6 +14,7 @@
 #include <QApplication>
 #include <QFileInfo>
 #include <QRadioButton>
+#include <QRegularExpression>
 
 #include <utility>
 
@@ -36,6 +37,16 @@ void SetFileStatus(QLabel* label, const QString& text, bool coloured) {
 void SetEnabled(std::initializer_list<QWidget*> widgets, bool enabled) {
     for (QWidget* w : widgets)
         w->setEnabled(enabled);
+}
+
+// The lines of a text joined into one, for a label one line high.
+QString OneLine(const QString& text) {
+    if (!text.contains(QLatin1Char('\n')) && !text.contains(QLatin1Char('\r'))) return text;
+    QStringList lines =
+        text.split(QRegularExpression(QStringLiteral("[\r\n]+")), Qt::SkipEmptyParts);
+    for (QString& line : lines)
+        line = line.trimmed();
+    return lines.join(QStringLiteral(" \u2014 "));
 }
 
 // What an empty file list tells the user to do next.
@@ -204,14 +215,17 @@ void frm_WebDataClient::AddTrace(const QString& text) {
 
 void frm_WebDataClient::ShowStatus(const QString& text) {
     AddTrace(QStringLiteral("Status>") + text);
-    if (engine_->IsBusy() && !text.isEmpty() && !c_.Lbl_status->text().isEmpty()) {
+    // The label is one line high: a text of several lines is shown as one.
+    const QString line = OneLine(text);
+    if (engine_->IsBusy() && !line.isEmpty() && !c_.Lbl_status->text().isEmpty()) {
         // During a run the exchanges report several texts a file: the label
         // keeps its colour and is drawn at the window's pace.
-        c_.Lbl_status->setText(text);
+        c_.Lbl_status->setText(line);
     } else {
-        SetStatusLabel(c_.Lbl_status, text);
+        SetStatusLabel(c_.Lbl_status, line);
     }
-    if (isMinimized()) setWindowTitle(text);
+    c_.Lbl_status->setToolTip(line);
+    if (isMinimized()) setWindowTitle(line);
 }
 
 } // namespace quorvel
