@@ -226,8 +226,8 @@ void BuildWindowControls(QMainWindow* window, WindowControls& c) {
     c.SSTab1->addTab(Scrolled(BuildOptionsTab(c)), QStringLiteral("Options"));
     upper->addWidget(c.SSTab1);
     upper->addWidget(BuildFileListColumn(c, upper));
-    upper->setStretchFactor(0, 1);
-    upper->setStretchFactor(1, 0);
+    upper->setStretchFactor(0, 4);
+    upper->setStretchFactor(1, 1);
 
     auto* lower = new QWidget(c.Spl_Window);
     auto* bottom = new QVBoxLayout(lower);

@@ -40,7 +40,7 @@ QString frm_WebDataClient::AboutText() {
 }
 
 void frm_WebDataClient::mnu_About_Click() {
-    dialogs_.about(this, QStringLiteral("About Quorvel"), AboutText());
+    dialogs_.about(this, QStringLiteral("About"), AboutText());
 }
 
 void frm_WebDataClient::ConfigureRecentFiles() {
