@@ -177,11 +177,12 @@ TEST_F(SettingsTest, TheAutostartEntryCarriesAHomeThatIsNotTheDefault) {
         const QStringList exec = lines.filter(QRegularExpression("^Exec="));
         ASSERT_EQ(exec.size(), 1) << c.arguments.toStdString();
         EXPECT_TRUE(exec[0].endsWith(" " + c.arguments)) << exec[0].toStdString();
-        // The box reads the entry back as ticked.
+        // The box reads the entry back as ticked; unticking removes it.
         Close();
         Start();
         EXPECT_TRUE(C().Chk_RunAtStartUp->isChecked());
         C().Chk_RunAtStartUp->click();
+        EXPECT_FALSE(QFile::exists(AutostartEntry()));
         Close();
     }
     ProgramHome::SetFolder(home.Path());
