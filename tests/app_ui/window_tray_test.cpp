@@ -9,6 +9,7 @@
 #include "support/ini_store.h"
 #include "support/program_home.h"
 
+#include <QApplication>
 #include <QMessageBox>
 
 namespace quorvel::testing {
@@ -109,6 +110,19 @@ TEST_F(WindowTrayTest, CloseKeepsRunningInTheTraySaysSoOnceAndQuitEndsIt) {
     EXPECT_EQ(quits, 1);
     EXPECT_EQ(Stored("LastDownload"), "never"); // the settings were written
     EXPECT_TRUE(home.Read("files.txt").contains("~Edited~"));
+    EXPECT_FALSE(Tray().Shown());
+    EXPECT_TRUE(QApplication::quitOnLastWindowClosed());
+}
+
+// Without automatic runs a close is the end, also for a start with "/S".
+TEST_F(WindowTrayTest, CloseWithoutAutomaticRunsEndsTheProgramAndTakesTheIcon) {
+    StartWith(false, {"/S"});
+    ASSERT_TRUE(Tray().Shown());
+    EXPECT_FALSE(QApplication::quitOnLastWindowClosed());
+    EXPECT_TRUE(window->close());
+    EXPECT_FALSE(Tray().Shown());
+    EXPECT_TRUE(QApplication::quitOnLastWindowClosed()); // the program ends with the window
+    EXPECT_TRUE(Tray().Notices().isEmpty());
 }
 
 TEST_F(WindowTrayTest, ProcessAllFromTheMenuRunsTheListWhenTheWindowMay) {

@@ -202,6 +202,7 @@ void frm_WebDataClient::closeEvent(QCloseEvent* event) {
         return;
     }
     Form_Unload();
+    tray_->Closed();
     event->accept();
 }
 

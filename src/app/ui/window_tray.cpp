@@ -51,6 +51,13 @@ bool WindowTray::Available() {
     return QSystemTrayIcon::isSystemTrayAvailable();
 }
 
+void WindowTray::Closed() {
+    if (!shown_) return;
+    shown_ = false;
+    icon_.hide();
+    QApplication::setQuitOnLastWindowClosed(true);
+}
+
 void WindowTray::Refresh() {
     const bool unattended = window_.StartedMinimised() || scheduler_.IsAutomatic();
     const bool show = unattended && Available();

@@ -40,6 +40,8 @@ public:
     // Asked by the window's close: true when the program goes on in the tray
     // instead (runs are automatic and the close does not come from Quit).
     bool KeepRunningOnClose();
+    // The window closed for good: the icon goes, and the program ends with it.
+    void Closed();
     // The notices shown so far (the tray's balloon messages).
     const QStringList& Notices() const { return notices_; }
 
