@@ -75,6 +75,9 @@ QGroupBox* MakeFrame(const QString& name, const QString& caption, QWidget* paren
 
 namespace {
 
+constexpr int kMoveUp = 1;
+constexpr int kMoveDown = 2;
+
 QWidget* BuildFileListColumn(WindowControls& c, QWidget* parent) {
     auto* column = new QWidget(parent);
     auto* layout = new QVBoxLayout(column);
@@ -96,8 +99,11 @@ QWidget* BuildFileListColumn(WindowControls& c, QWidget* parent) {
     c.Cmd_DoFile[2]->setIcon(column->style()->standardIcon(QStyle::SP_ArrowDown));
     c.Cmd_DoFile[2]->setToolTip(QStringLiteral("Move the selected file down"));
     c.Cmd_DoFile[3] = MakeButton(Indexed("Cmd_DoFile", 3), QStringLiteral("Delete"), column);
+    // The arrows need no more room than their pictures: the list may be narrow.
+    for (int i : {kMoveUp, kMoveDown})
+        c.Cmd_DoFile[i]->setMaximumWidth(c.Cmd_DoFile[i]->sizeHint().height() + 8);
     for (int i = 0; i < 4; ++i)
-        buttons->addWidget(c.Cmd_DoFile[i]);
+        buttons->addWidget(c.Cmd_DoFile[i], i == kMoveUp || i == kMoveDown ? 0 : 1);
     layout->addLayout(buttons);
     return column;
 }
