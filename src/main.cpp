@@ -5,6 +5,7 @@
 #include "app/run/command_line_run.h"
 #include "app/run/unattended_prompter.h"
 #include "app/ui/frm_web_data_client.h"
+#include "app/ui/no_display.h"
 #include "app/ui/window_ports.h"
 #include "app/window_instance.h"
 #include "support/cipher.h"
@@ -141,6 +142,7 @@ int main(int argc, char* argv[]) {
     if (const int code = TakeCaFile(line); code >= 0) return code;
     if (line.runAll) return RunAll(argc, argv, line);
 
+    if (quorvel::ReportMissingDisplay(argc, argv)) return 2;
     QApplication app(argc, argv);
     ChooseHome(line);
     quorvel::WindowInstance instance(quorvel::ProgramHome::Folder());

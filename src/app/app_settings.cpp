@@ -19,8 +19,9 @@ std::int16_t CheckValue(const QString& text) {
     return IsNonZero(text) ? 1 : 0;
 }
 
-// Reads the settings in start-up order; an option index that is no 16-bit
-// number stops the reading.
+// Reads the settings in start-up order. An option index that is no 16-bit
+// number keeps its own default and is reported; the reading goes on, so one
+// bad line never costs the other settings (they are written back at exit).
 class SettingsReader {
 public:
     explicit SettingsReader(const LocalSettings& settings) : settings_(settings) {}
@@ -29,17 +30,16 @@ public:
         return settings_.GetLocalSetting(QString::fromLatin1(key), fallback);
     }
 
-    bool OptionIndex(const char* key, const char* fallback, std::int16_t& target) {
+    void OptionIndex(const char* key, const char* fallback, std::int16_t& target) {
         const QString text = Text(key, QString::fromLatin1(fallback));
         const auto index = ToInt16(text);
-        if (!index) {
-            error_ = AppError{IsNumericText(text) ? QStringLiteral("Overflow")
-                                                  : QStringLiteral("Type mismatch"),
-                              QStringLiteral("Load")};
-            return false;
-        }
-        target = *index;
-        return true;
+        target = index ? *index : static_cast<std::int16_t>(QString::fromLatin1(fallback).toInt());
+        if (index || error_) return;
+        error_ = AppError{
+            (IsNumericText(text) ? QStringLiteral("Overflow") : QStringLiteral("Type mismatch")) +
+                QStringLiteral(": %1=%2 (its default %3 is used)")
+                    .arg(QLatin1String(key), text, QLatin1String(fallback)),
+            QStringLiteral("Load")};
     }
 
     const std::optional<AppError>& Error() const { return error_; }
@@ -77,10 +77,11 @@ QString SingleText(float value) {
     return QString::number(static_cast<double>(value), 'g', 7).toUpper();
 }
 
-AppSettings AppSettings::Defaults(const QString& programFolder, int currentYear) {
+AppSettings AppSettings::Defaults(const QString& programFolder, int currentYear,
+                                  const QString& dataFolder) {
     AppSettings s;
     s.applicationFolder = programFolder;
-    s.dataFolder = programFolder;
+    s.dataFolder = dataFolder.isEmpty() ? programFolder : dataFolder;
     s.interval = QStringLiteral("3 hrs");
     s.lastDownload = QStringLiteral("never");
     s.afterDate = DefaultAfterDate(currentYear);
@@ -90,24 +91,24 @@ AppSettings AppSettings::Defaults(const QString& programFolder, int currentYear)
 }
 
 std::optional<AppError> AppSettings::Load(const LocalSettings& settings,
-                                          const QString& programFolder, int currentYear) {
+                                          const QString& programFolder, int currentYear,
+                                          const QString& defaultDataFolder) {
     SettingsReader in(settings);
     cfgUrl = in.Text("CFG_URL", {});
     userId = in.Text("UserID", {});
     password = KeptPassword(settings, in.Text("Password", {}));
     applicationFolder = in.Text("ApplicationFolder", programFolder);
-    dataFolder = in.Text("DataFolder", programFolder);
+    dataFolder =
+        in.Text("DataFolder", defaultDataFolder.isEmpty() ? programFolder : defaultDataFolder);
     showDate0 = CheckValue(in.Text("ShowDate0", QStringLiteral("1")));
-    if (!in.OptionIndex("GetLocalFolders", "1", getLocalFolders) ||
-        !in.OptionIndex("GetFileList", "1", getFileList) ||
-        !in.OptionIndex("Automatic", "0", automatic)) {
-        return in.Error();
-    }
+    in.OptionIndex("GetLocalFolders", "1", getLocalFolders);
+    in.OptionIndex("GetFileList", "1", getFileList);
+    in.OptionIndex("Automatic", "0", automatic);
     interval = in.Text("Interval", QStringLiteral("3 hrs"));
     lastDownload = in.Text("LastDownload", QStringLiteral("never"));
     nextDownloadDue = in.Text("NextDownloadDue", {});
     downloadOnly = CheckValue(in.Text("DownloadOnly", QStringLiteral("0")));
-    if (!in.OptionIndex("Whichdates", "0", whichdates)) return in.Error();
+    in.OptionIndex("Whichdates", "0", whichdates);
     afterDate = in.Text("AfterDate", DefaultAfterDate(currentYear));
     for (int number = 1; number <= RecentFiles::kEntries; ++number) {
         const QByteArray key = "File" + QByteArray::number(number);
@@ -115,11 +116,12 @@ std::optional<AppError> AppSettings::Load(const LocalSettings& settings,
     }
     loadedFile = in.Text("File1", AddTrailingSlash(applicationFolder) + kDefaultListName);
     recentFiles.SetEntry(1, loadedFile);
-    return std::nullopt;
+    return in.Error();
 }
 
 std::optional<AppError> AppSettings::Load(const LocalSettings& settings) {
-    return Load(settings, ProgramHome::Folder(), CurrentClock().Now().date().year());
+    return Load(settings, ProgramHome::Folder(), CurrentClock().Now().date().year(),
+                ProgramHome::DefaultDataFolder());
 }
 
 bool AppSettings::Save(LocalSettings& settings) const {
@@ -144,11 +146,17 @@ bool AppSettings::Save(LocalSettings& settings) const {
         {"GetLocalFolders", number(getLocalFolders)},
         {"DownloadOnly", number(downloadOnly)},
     };
-    bool ok = true;
-    for (const auto& [key, value] : values) {
-        ok = settings.SaveLocalSetting(QString::fromLatin1(key), value) && ok;
+    std::vector<IniEntry> entries;
+    for (const auto& [key, value] : values)
+        entries.push_back({QString::fromLatin1(key), value});
+    // The recent lists; a free entry has no line (an empty "File1" would read
+    // as no list at all instead of the default list).
+    for (int number = 1; number <= RecentFiles::kEntries; ++number) {
+        if (!recentFiles.Entry(number).isEmpty())
+            entries.push_back({QStringLiteral("File%1").arg(number), recentFiles.Entry(number)});
     }
-    return ok;
+    // One replacement of the file for all of them: each one is synced to disk.
+    return settings.SaveLocalSettings(entries);
 }
 
 } // namespace quorvel

@@ -31,7 +31,7 @@ struct AppSettings {
     std::int16_t downloadOnly = 0;    // "DownloadOnly": check box 1 or 0
     std::int16_t whichdates = 0;      // "Whichdates": 0 New data, 1 Data after
     QString afterDate;                // "AfterDate"
-    RecentFiles recentFiles;          // "File1" to "File5", read only
+    RecentFiles recentFiles;          // "File1" to "File5"
     QString loadedFile;               // the file list in use ("File1" or files.txt)
 
     // Written at exit but never read back.
@@ -42,17 +42,20 @@ struct AppSettings {
     bool operator==(const AppSettings&) const = default;
 
     // The values of a first start without a settings file.
-    static AppSettings Defaults(const QString& programFolder, int currentYear);
+    // dataFolder: the data folder's default (the program's folder when empty).
+    static AppSettings Defaults(const QString& programFolder, int currentYear,
+                                const QString& dataFolder = {});
 
     // Reads every key in order, each with its default. An option index that is
-    // not a 16-bit number ends the reading with an error ("Load"); the values
-    // not yet read keep what they held.
+    // not a 16-bit number takes its own default; the first such key comes back
+    // as the error ("Load") and every other key is read as usual.
     std::optional<AppError> Load(const LocalSettings& settings, const QString& programFolder,
-                                 int currentYear);
-    // The same with the program's folder and the clock's year.
+                                 int currentYear, const QString& defaultDataFolder = {});
+    // The same with the program's folders and the clock's year.
     std::optional<AppError> Load(const LocalSettings& settings);
 
-    // Writes every written key in the order of exit; false when a write failed.
+    // Writes every written key in the order of exit, then the recent lists,
+    // with one replacement of the file; false when it failed.
     bool Save(LocalSettings& settings) const;
 };
 

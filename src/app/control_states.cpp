@@ -7,13 +7,16 @@ ControlStates DeriveControlStates(const ControlInputs& in) {
     const bool idle = !in.busy;
     const bool selected = in.selected >= 0;
     ControlStates s;
-    s.recordFields = editable && idle;
+    // Without a selection there is no record the fields could go into.
+    s.recordFields = editable && idle && selected;
     s.fileList = idle;
     s.fileMenu = editable;
     s.fileMenuEnabled = idle;
     s.getFileList = !editable && idle;
     s.clearFiles = idle;
-    s.newEntry = selected && editable && idle;
+    // New entries go before the selection, or at the end of an empty list or
+    // one with nothing selected.
+    s.newEntry = editable && idle;
     s.moveUp = in.selected > 0 && editable && idle;
     s.moveDown = selected && editable && in.selected < in.count - 1 && idle;
     s.deleteEntry = selected && editable && idle;

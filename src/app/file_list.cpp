@@ -118,6 +118,9 @@ ListLoadResult FileList::LoadDataFile(const QString& path) {
         }
     }
     LoadedFile = path;
+    // A list just read is what its file holds: nothing to write back (an
+    // earlier list's changes must not make this one be rewritten at exit).
+    ListChanged = false;
     return result;
 }
 

@@ -51,7 +51,8 @@ public:
     std::optional<AppError> LoadFilesRecord(const QString& line);
 
     // Replaces the records with those of the file at path; a missing file gives
-    // an empty list that will be written there. LoadedFile becomes path.
+    // an empty list that will be written there. LoadedFile becomes path and
+    // ListChanged is cleared.
     // Whatever kept records out (too many, a number too large, a line too
     // long) comes back as one error that counts them, never one per line.
     ListLoadResult LoadDataFile(const QString& path);

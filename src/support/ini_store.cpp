@@ -105,8 +105,12 @@ QString IniStore::Read(const QString& section, const QString& key, const QString
     return fallback.left(kMaxValueLength);
 }
 
-bool IniStore::Write(const QString& section, const QString& key, const QString& value) {
-    IniText text = ReadLines(path_);
+namespace {
+
+// Puts key=value into the section of text: the key's line when it has one,
+// else a new line after the section's last non-blank line (a new section at
+// the end when there is none).
+void SetEntry(IniText& text, const QString& section, const QString& key, const QString& value) {
     // A line break inside a value would start a new line of the file.
     QString clean = value;
     clean.replace(u'\r', u' ').replace(u'\n', u' ');
@@ -114,24 +118,32 @@ bool IniStore::Write(const QString& section, const QString& key, const QString& 
 
     if (const auto range = FindSection(text.lines, section)) {
         qsizetype insertAt = range->first;
-        bool replaced = false;
         for (qsizetype i = range->first; i < range->second; ++i) {
             if (IsKeyLine(TextOf(text.lines[i]), key)) {
                 text.lines[i].text = entry;
-                replaced = true;
-                break;
+                return;
             }
             if (!IsBlank(text.lines[i])) insertAt = i + 1;
         }
-        if (!replaced) InsertLine(text, insertAt, entry);
-    } else {
-        if (!text.lines.empty() && !IsBlank(text.lines.back()))
-            InsertLine(text, static_cast<qsizetype>(text.lines.size()), {});
-        InsertLine(text, static_cast<qsizetype>(text.lines.size()),
-                   (u'[' + section + u']').toUtf8());
-        InsertLine(text, static_cast<qsizetype>(text.lines.size()), entry);
+        InsertLine(text, insertAt, entry);
+        return;
     }
+    if (!text.lines.empty() && !IsBlank(text.lines.back()))
+        InsertLine(text, static_cast<qsizetype>(text.lines.size()), {});
+    InsertLine(text, static_cast<qsizetype>(text.lines.size()), (u'[' + section + u']').toUtf8());
+    InsertLine(text, static_cast<qsizetype>(text.lines.size()), entry);
+}
 
+} // namespace
+
+bool IniStore::Write(const QString& section, const QString& key, const QString& value) {
+    return WriteAll(section, {{key, value}});
+}
+
+bool IniStore::WriteAll(const QString& section, const std::vector<IniEntry>& entries) {
+    IniText text = ReadLines(path_);
+    for (const IniEntry& entry : entries)
+        SetEntry(text, section, entry.key, entry.value);
     // The settings hold a password: a new file is for its owner's eyes only.
     const auto error =
         ReplaceFileContents(path_, Joined(text), QFileDevice::ReadOwner | QFileDevice::WriteOwner);
@@ -147,9 +159,24 @@ QString LocalSettings::GetLocalSetting(const QString& key, const QString& fallba
     return value;
 }
 
+namespace {
+
+QString StoredValue(const QString& value) {
+    return value.isEmpty() ? QStringLiteral("Null") : value;
+}
+
+} // namespace
+
 bool LocalSettings::SaveLocalSetting(const QString& key, const QString& value) {
-    return store_.Write(QStringLiteral("General"), key,
-                        value.isEmpty() ? QStringLiteral("Null") : value);
+    return store_.Write(QStringLiteral("General"), key, StoredValue(value));
+}
+
+bool LocalSettings::SaveLocalSettings(const std::vector<IniEntry>& entries) {
+    std::vector<IniEntry> stored;
+    stored.reserve(entries.size());
+    for (const IniEntry& entry : entries)
+        stored.push_back({entry.key, StoredValue(entry.value)});
+    return store_.WriteAll(QStringLiteral("General"), stored);
 }
 
 } // namespace quorvel

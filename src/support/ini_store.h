@@ -8,7 +8,14 @@
 
 #include <QString>
 
+#include <vector>
+
 namespace quorvel {
+
+struct IniEntry {
+    QString key;
+    QString value;
+};
 
 class IniStore {
 public:
@@ -21,6 +28,8 @@ public:
     // Creates the file, the section or the key as needed; false when it failed,
     // with the reason in LastError() and the file as it was.
     bool Write(const QString& section, const QString& key, const QString& value);
+    // Sets every entry, in order, with one replacement of the file.
+    bool WriteAll(const QString& section, const std::vector<IniEntry>& entries);
     // Names the file and gives the system's reason; empty after a good write.
     const QString& LastError() const { return lastError_; }
 
@@ -39,6 +48,8 @@ public:
 
     QString GetLocalSetting(const QString& key, const QString& fallback) const;
     bool SaveLocalSetting(const QString& key, const QString& value);
+    // Every key in one write of the file (empty values as "Null").
+    bool SaveLocalSettings(const std::vector<IniEntry>& entries);
 
     const QString& Path() const { return store_.Path(); }
     const QString& LastError() const { return store_.LastError(); }

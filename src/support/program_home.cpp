@@ -14,19 +14,19 @@ QString& ChosenFolder() {
     return folder;
 }
 
-bool IsWritableFolder(const QString& folder) {
-    const QFileInfo info(folder);
-    return info.isDir() && info.isWritable();
+QString ConfigFolder() {
+    return QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) +
+           QStringLiteral("/quorvel");
+}
+
+QString ExeFolder() {
+    return QCoreApplication::instance() ? QCoreApplication::applicationDirPath() : QString();
 }
 
 QString DefaultFolder() {
-    const QString exeFolder =
-        QCoreApplication::instance() ? QCoreApplication::applicationDirPath() : QString();
-    if (!exeFolder.isEmpty() && IsWritableFolder(exeFolder)) return exeFolder;
-    const QString config =
-        QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) + "/quorvel";
-    QDir().mkpath(config);
-    return config;
+    const QString folder = ProgramHome::DefaultFolderFor(ExeFolder(), ProgramHome::ProgramName());
+    QDir().mkpath(folder);
+    return QDir::cleanPath(folder);
 }
 
 QString Absolute(const QString& folder) {
@@ -60,6 +60,27 @@ void ProgramHome::SetFolder(const QString& folder) {
 QString ProgramHome::Folder() {
     if (ChosenFolder().isEmpty()) ChosenFolder() = DefaultFolder();
     return QDir::toNativeSeparators(ChosenFolder());
+}
+
+QString ProgramHome::DefaultFolderFor(const QString& exeFolder, const QString& programName) {
+    if (!exeFolder.isEmpty() &&
+        QFileInfo(exeFolder + QLatin1Char('/') + programName + QStringLiteral(".ini")).isFile())
+        return exeFolder;
+    return ConfigFolder();
+}
+
+bool ProgramHome::IsDefault() {
+    const QString chosen = QDir::cleanPath(QFileInfo(Folder()).absoluteFilePath());
+    const QString own =
+        QDir::cleanPath(QFileInfo(DefaultFolderFor(ExeFolder(), ProgramName())).absoluteFilePath());
+    return chosen == own;
+}
+
+QString ProgramHome::DefaultDataFolder() {
+    if (QDir::cleanPath(Folder()) != QDir::cleanPath(ConfigFolder())) return Folder();
+    const QString documents = QStandardPaths::writableLocation(QStandardPaths::DocumentsLocation);
+    if (documents.isEmpty()) return Folder();
+    return QDir::toNativeSeparators(documents + QStringLiteral("/Quorvel"));
 }
 
 QString ProgramHome::ProgramName() {

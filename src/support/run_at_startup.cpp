@@ -56,11 +56,20 @@ bool FileFound(const QString& path) {
     return QFileInfo::exists(path);
 }
 
+QStringList Split(const QString& arguments) {
+    return arguments.split(QLatin1Char(' '), Qt::SkipEmptyParts);
+}
+
 } // namespace
 
 QString AutostartEntryText(const QString& name, const QString& exePath, const QString& arguments) {
+    return AutostartEntryText(name, exePath, Split(arguments));
+}
+
+QString AutostartEntryText(const QString& name, const QString& exePath,
+                           const QStringList& arguments) {
     QStringList exec{ExecArgument(exePath)};
-    for (const QString& argument : arguments.split(QLatin1Char(' '), Qt::SkipEmptyParts))
+    for (const QString& argument : arguments)
         exec << ExecArgument(argument);
     return QStringLiteral("[Desktop Entry]\n"
                           "Type=Application\n"
@@ -78,9 +87,14 @@ QString ShortcutFileName(bool allUsers) {
 }
 
 bool CreateShortcut(bool allUsers, const QString& arguments) {
+    return CreateShortcut(allUsers, Split(arguments));
+}
+
+bool CreateShortcut(bool allUsers, const QStringList& arguments) {
     const QString path = ShortcutFileName(allUsers);
     if (FileFound(path)) return true;
-    const QString where = kWhere + QStringLiteral("CreateShortcut switch= ") + arguments;
+    const QString where =
+        kWhere + QStringLiteral("CreateShortcut switch= ") + arguments.join(QLatin1Char(' '));
     if (!QDir().mkpath(QFileInfo(path).absolutePath()))
         return ShowErrorBox(QStringLiteral("Cannot create the folder of ") + path, where);
     const QString text = AutostartEntryText(ProgramHome::ProgramName(),
@@ -99,12 +113,20 @@ bool DeleteShortcutFile(const QString& path) {
     return true;
 }
 
-int GetRunAtStartup(bool allUsers, const QString& /*arguments*/) {
+int GetRunAtStartup(bool allUsers, const QString& arguments) {
+    return GetRunAtStartup(allUsers, Split(arguments));
+}
+
+int GetRunAtStartup(bool allUsers, const QStringList& /*arguments*/) {
     // The arguments are only needed to move a Windows Run-key value; see the header.
     return FileFound(ShortcutFileName(allUsers)) ? 1 : 0;
 }
 
 void SetRunAtStartup(int on, bool allUsers, const QString& arguments) {
+    SetRunAtStartup(on, allUsers, Split(arguments));
+}
+
+void SetRunAtStartup(int on, bool allUsers, const QStringList& arguments) {
     if (on != 0)
         CreateShortcut(allUsers, arguments);
     else

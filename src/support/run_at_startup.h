@@ -12,6 +12,7 @@
 // a no-op there.
 
 #include <QString>
+#include <QStringList>
 
 namespace quorvel {
 
@@ -20,6 +21,8 @@ QString ShortcutFileName(bool allUsers);
 
 // Creates the entry unless a file of that name exists already (an existing
 // entry is left unchanged). False, after the error box, when it cannot be written.
+bool CreateShortcut(bool allUsers, const QStringList& arguments);
+// The same with the arguments given as one text, split at blanks ("/S").
 bool CreateShortcut(bool allUsers, const QString& arguments);
 
 // Deletes the entry when it exists. False, after the error box, when it exists
@@ -27,12 +30,17 @@ bool CreateShortcut(bool allUsers, const QString& arguments);
 bool DeleteShortcutFile(const QString& path);
 
 // 1 when the entry exists, 0 when not (the check box's values).
+int GetRunAtStartup(bool allUsers, const QStringList& arguments);
 int GetRunAtStartup(bool allUsers, const QString& arguments);
 
 // on != 0 creates the entry, 0 deletes it.
+void SetRunAtStartup(int on, bool allUsers, const QStringList& arguments);
 void SetRunAtStartup(int on, bool allUsers, const QString& arguments);
 
-// The entry's text for the program at exePath started with arguments.
+// The entry's text for the program at exePath started with arguments, each
+// quoted as the desktop entry specification requires.
+QString AutostartEntryText(const QString& name, const QString& exePath,
+                           const QStringList& arguments);
 QString AutostartEntryText(const QString& name, const QString& exePath, const QString& arguments);
 
 } // namespace quorvel

@@ -10,6 +10,11 @@
 
 #include <gtest/gtest.h>
 
+#include <sys/inotify.h>
+#include <unistd.h>
+
+#include <functional>
+
 namespace quorvel {
 namespace {
 
@@ -47,17 +52,45 @@ TEST(AppSettingsLoad, NullInAnyLetterCaseReadsEmptyNotTheDefault) {
     EXPECT_EQ(s.loadedFile, "files.txt");
 }
 
-TEST(AppSettingsLoad, AnOptionIndexThatIsNoSixteenBitNumberStopsTheReading) {
-    TempHome home;
-    std::optional<AppError> error;
-    const AppSettings s =
-        LoadFrom(home.Write("q.ini", "[General]\r\nUserID=farm\r\nGetFileList=user"
-                                     "\r\nAutomatic=1\r\nInterval=1 day\r\n"),
-                 &error);
-    EXPECT_EQ(error, (AppError{"Type mismatch", "Load"}));
-    EXPECT_TRUE(s.userId == "farm" && s.automatic == 0 && s.interval.isEmpty());
-    LoadFrom(home.Write("q.ini", "[General]\r\nWhichdates=99999\r\n"), &error);
-    EXPECT_EQ(error, (AppError{"Overflow", "Load"}));
+TEST(AppSettingsLoad, AnUnreadableOptionIndexFallsBackAloneAndIsReported) {
+    struct Case {
+        const char* key;
+        const char* value;
+        const char* error;
+    };
+    const Case cases[] = {{"GetLocalFolders", "many", "Type mismatch"},
+                          {"GetFileList", "user", "Type mismatch"},
+                          {"Whichdates", "99999", "Overflow"}};
+    for (const Case& c : cases) {
+        TempHome home;
+        std::optional<AppError> error;
+        QByteArray file = "[General]\r\nUserID=farm\r\nGetLocalFolders=0\r\nGetFileList=0\r\n"
+                          "Whichdates=1\r\nAutomatic=1\r\nInterval=1 day\r\n"
+                          "AfterDate=2 Feb 2022\r\n";
+        const QByteArray key = QByteArray(c.key) + "=";
+        const qsizetype at = file.indexOf(key) + key.size();
+        file.replace(at, 1, c.value);
+        const AppSettings s = LoadFrom(home.Write("q.ini", file), &error);
+        ASSERT_TRUE(error.has_value()) << c.key;
+        EXPECT_TRUE(error->description.startsWith(c.error)) << error->description.toStdString();
+        EXPECT_TRUE(error->description.contains(QString(c.key) + "=" + c.value))
+            << error->description.toStdString();
+        EXPECT_EQ(error->where, "Load");
+        // Every other value is the stored one; the bad one its own default.
+        const AppSettings defaults = AppSettings::Defaults("/opt/q", 2024);
+        const std::pair<const char*, std::pair<std::int16_t, std::int16_t>> options[] = {
+            {"GetLocalFolders", {s.getLocalFolders, defaults.getLocalFolders}},
+            {"GetFileList", {s.getFileList, defaults.getFileList}},
+            {"Whichdates", {s.whichdates, defaults.whichdates}}};
+        for (const auto& [key, values] : options) {
+            const std::int16_t stored = QString(key) == "Whichdates" ? 1 : 0;
+            EXPECT_EQ(values.first, QString(key) == c.key ? values.second : stored)
+                << c.key << " " << key;
+        }
+        EXPECT_TRUE(s.userId == "farm" && s.automatic == 1 && s.interval == "1 day" &&
+                    s.afterDate == "2 Feb 2022")
+            << c.key;
+    }
 }
 
 TEST(AppSettingsSave, EditedValuesSurviveARestart) {
@@ -92,9 +125,63 @@ TEST(AppSettingsSave, KeysInExitOrderEmptyAsNullAndTheFileOwnerOnly) {
         EXPECT_GT(text.indexOf("\n" + key), last) << key.toStdString();
         last = text.indexOf("\n" + key);
     }
-    EXPECT_FALSE(text.contains("File1"));
+    // The recent list is written with the others; free entries are not.
+    EXPECT_GT(text.indexOf("\nFile1=/opt/q/files.txt"), last);
+    EXPECT_FALSE(text.contains("File2"));
     const auto others = QFileDevice::ReadGroup | QFileDevice::ReadOther | QFileDevice::WriteOther;
     EXPECT_FALSE(QFile::permissions(home.File("q.ini")) & others);
+}
+
+TEST(AppSettingsSave, RecentListsSurviveARestart) {
+    TempHome home;
+    const QString path = home.File("q.ini");
+    AppSettings s = LoadFrom(path);
+    for (const char* list : {"/lists/a.txt", "/lists/b.txt", "/lists/c.txt"})
+        s.recentFiles.Add(list);
+    LocalSettings store(path);
+    ASSERT_TRUE(s.Save(store));
+    const AppSettings again = LoadFrom(path);
+    EXPECT_EQ(again.recentFiles, s.recentFiles);
+    EXPECT_EQ(again.loadedFile, "/lists/c.txt");
+}
+
+// Counts the renames onto one file of a folder while work runs. The folder's
+// creations are watched too: the kernel folds an event into the one queued
+// before it when both are alike, and the temporary file of each replacement
+// stands between two renames.
+int RenamesOnto(const QString& folder, const QString& name, const std::function<void()>& work) {
+    const int watch = inotify_init1(IN_NONBLOCK);
+    if (watch < 0 || inotify_add_watch(watch, QFile::encodeName(folder).constData(),
+                                       IN_MOVED_TO | IN_CREATE) < 0)
+        return -1;
+    work();
+    int count = 0;
+    alignas(inotify_event) char buffer[64 * 1024];
+    for (ssize_t got; (got = read(watch, buffer, sizeof buffer)) > 0;) {
+        for (char* at = buffer; at < buffer + got;) {
+            const auto* event = reinterpret_cast<const inotify_event*>(at);
+            if ((event->mask & IN_MOVED_TO) && event->len > 0 &&
+                name == QFile::decodeName(event->name))
+                ++count;
+            at += sizeof(inotify_event) + event->len;
+        }
+    }
+    close(watch);
+    return count;
+}
+
+TEST(AppSettingsSave, ASaveReplacesTheSettingsFileOnceAndKeepsLinesItDoesNotOwn) {
+    TempHome home;
+    const QByteArray foreign = "; kept as it is\r\n[Window]\r\nGeometry=\xff\x01\r\n";
+    const QString path = home.Write("q.ini", foreign + "[General]\r\nUserID=old\r\n");
+    AppSettings s = LoadFrom(path);
+    s.userId = "farm";
+    LocalSettings store(path);
+    bool saved = false;
+    EXPECT_EQ(RenamesOnto(home.Path(), "q.ini", [&] { saved = s.Save(store); }), 1);
+    EXPECT_TRUE(saved);
+    EXPECT_TRUE(home.Read("q.ini").startsWith(foreign + "[General]\r\nUserID=farm\r\n"));
+    EXPECT_EQ(LoadFrom(path), s);
 }
 
 } // namespace

@@ -22,7 +22,8 @@ TEST(ControlStates, RecordCommandsFollowTheSelectionInAListTheUserKeeps) {
         int selected;
         Commands expected;
     };
-    const Case cases[] = {{-1, {false, false, false, false, false}},
+    // "New" adds to an empty list or one with nothing selected too.
+    const Case cases[] = {{-1, {true, false, false, false, false}},
                           {0, {true, false, true, true, true}},
                           {1, {true, true, true, true, true}},
                           {2, {true, true, false, true, true}}};
@@ -30,8 +31,11 @@ TEST(ControlStates, RecordCommandsFollowTheSelectionInAListTheUserKeeps) {
         ControlInputs in{.listFromUser = true, .selected = c.selected, .count = 3};
         const ControlStates s = DeriveControlStates(in);
         EXPECT_EQ(CommandsOf(s), c.expected) << c.selected;
-        EXPECT_TRUE(s.processAll && s.recordFields && s.fileMenu && !s.getFileList);
+        EXPECT_TRUE(s.processAll && s.fileMenu && !s.getFileList);
+        // Without a selection there is no record to edit.
+        EXPECT_EQ(s.recordFields, c.selected >= 0) << c.selected;
     }
+    EXPECT_TRUE(DeriveControlStates({.listFromUser = true}).newEntry); // an empty list
     // The only entry can move neither way.
     const ControlStates only =
         DeriveControlStates({.listFromUser = true, .selected = 0, .count = 1});

@@ -122,6 +122,22 @@ TEST(FileListSave, WritesOnlyChangedListsAndWaitsForUsableFolders) {
     EXPECT_TRUE(list.ListChanged);
 }
 
+// The changes of one list never make the next one be written: a list just
+// read keeps its comment lines until something in it changes.
+TEST(FileListSave, AListJustReadIsNotWrittenForTheChangesOfTheOneBefore) {
+    TempHome home;
+    const QByteArray commented = "Files of farm 1\r\n" + kOldList;
+    FileList list;
+    ASSERT_TRUE(list.LoadDataFile(home.Write("first.txt", kOldList)).ok);
+    list.At(0).Name = "edited";
+    list.ListChanged = true;
+    ASSERT_TRUE(list.LoadDataFile(home.Write("second.txt", commented)).ok);
+    EXPECT_FALSE(list.ListChanged);
+    LocationFolders folders{home.Path(), home.File("data"), {}, {}, {}, {}};
+    EXPECT_FALSE(list.SaveFileList(folders).has_value());
+    EXPECT_EQ(home.Read("second.txt"), commented);
+}
+
 TEST(FileListEdit, NewFilesChosenTogetherStandInReverseBeforeTheSelectedEntry) {
     const LocationFolders folders{"/opt/quorvel", "/data", "Farm1", {}, {}, {}};
     FileList list;

@@ -5,6 +5,7 @@
 
 #include <QApplication>
 #include <QDir>
+#include <QMessageBox>
 
 namespace quorvel::testing {
 
@@ -58,6 +59,16 @@ frm_WebDataClient& WindowTest::Start(const QStringList& arguments) {
     dialogs.openFiles = answer;
     dialogs.openFile = [answer](auto&&... args) { return answer(args...).value(0); };
     dialogs.saveFile = dialogs.openFile;
+    dialogs.saveChanges = [this](QWidget*, const QString& name) {
+        unsavedAsked << name;
+        if (unsavedAnswers.empty()) return int(QMessageBox::Save);
+        const int answer = unsavedAnswers.front();
+        unsavedAnswers.erase(unsavedAnswers.begin());
+        return answer;
+    };
+    dialogs.about = [this](QWidget*, const QString& title, const QString& text) {
+        infoShown << title + "|" + text;
+    };
     window->SetFileDialogs(dialogs);
     window->Form_Load();
     window->show();

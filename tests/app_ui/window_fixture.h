@@ -13,6 +13,7 @@
 #include <ostream>
 
 #include <memory>
+#include <vector>
 
 QT_BEGIN_NAMESPACE
 // Readable texts in failure reports.
@@ -56,12 +57,18 @@ protected:
     static void ExpectEnabled(std::initializer_list<QWidget*> widgets, bool enabled);
     // Answers the next file dialogs with these paths (empty: cancelled).
     void AnswerDialogs(const QStringList& files);
+    // Answers the next unsaved-changes questions (QMessageBox::Save, Discard,
+    // Cancel), then Save.
+    void AnswerUnsaved(std::initializer_list<int> answers) { unsavedAnswers.assign(answers); }
 
     TempHome home;
     RecordingPorts ports;
     std::unique_ptr<frm_WebDataClient> window;
     QStringList dialogAnswer;
     int dialogsShown = 0;
+    std::vector<int> unsavedAnswers;
+    QStringList unsavedAsked; // the list names the questions named
+    QStringList infoShown;    // "title|text" of each informing box
 };
 
 } // namespace quorvel::testing

@@ -5,10 +5,13 @@
 
 #include "support/shell_open.h"
 #include "transfer/ftp.h"
+#include "webdata/script_server.h"
 #include "webdata/talu_web_data.h"
 
 #include <QDir>
 #include <QTcpServer>
+
+#include <utility>
 
 namespace quorvel::testing {
 namespace {
@@ -84,6 +87,53 @@ TEST_F(WindowStatesTest, LocalStatusShowsSizeMissingFileOrNothingAndTheLastDate)
     }
 }
 
+// With "Show" ticked for the web site each selection asks the service for the
+// last date and waits for the reply in the event loop. Selections made during
+// that wait never start a second exchange inside the first; the latest one is
+// what the status shows when the wait is over.
+TEST_F(WindowStatesTest, SelectionsDuringAServiceWaitStartNoExchangeInsideIt) {
+    ScriptServer server;
+    WaitLengths waits;
+    waits.replyGap = std::chrono::milliseconds(1000); // only a nested wait would reach it
+    ports.clock.SetWaits(waits);
+    UserMaintainsList();
+    QStringList lines;
+    for (const char* name : {"A", "B", "C"})
+        lines << QStringLiteral(" 0 ~1~%1~%2.dat~1~0~0~1~0~1~0~~~0")
+                     .arg(name, QString(name).toLower());
+    WriteList(lines);
+    Start();
+    C().Txt_httpServer->setText(server.HostPort());
+    window->ConfigureClass();
+    int nested = -1;
+    bool acted = false;
+    server.responder = [&](const QByteArray& request) {
+        // The day of the month tells the files apart: a.dat 1, b.dat 2, c.dat 3.
+        const int day = request.contains("file=a%2Edat")   ? 1
+                        : request.contains("file=b%2Edat") ? 2
+                                                           : 3;
+        Reply reply;
+        if (!std::exchange(acted, true))
+            reply.push_back(Act([&] {
+                const auto before = server.requests.size();
+                Select(1);
+                Select(2);
+                nested = int(server.requests.size() - before);
+            }));
+        reply.push_back(Send(HttpReply(QStringLiteral("OK 2006-05-%1 10:00:00\r\n")
+                                           .arg(day, 2, 10, QLatin1Char('0'))
+                                           .toLatin1())));
+        return reply;
+    };
+    C().chk_ShowDate[1]->setChecked(true);
+    EXPECT_EQ(nested, 0);
+    EXPECT_FALSE(window->RefreshingFileStatus());
+    ASSERT_EQ(server.requests.size(), 2);
+    EXPECT_TRUE(server.requests[1].contains("file=c%2Edat"));
+    EXPECT_EQ(window->CurrentRecordNumber(), 3);
+    EXPECT_EQ(C().Lbl_LastDate[1]->text(), "3 May 2006 10:00:00");
+}
+
 TEST_F(WindowStatesTest, EditOpensTheLocalFileAndRefusesANameClimbingOut) {
     UserMaintainsList();
     WriteList({Line("Rain", "rain.csv"), Line("Escape", "../../etc/passwd")});
@@ -132,6 +182,11 @@ TEST_F(WindowStatesTest, TraceAndWebDataEventsReachStatusAndTraceOneLinePerLine)
         EXPECT_EQ(C().Lst_Trace->item(i)->text(), expected[i]);
     C().Cmd_Clear->click();
     EXPECT_EQ(C().Lst_Trace->count(), 0);
+    // The status label is one line high: a reason of two lines is shown whole on it.
+    window->ShowStatus("Could not connect to http://\nURL using bad/illegal format\r\n");
+    EXPECT_EQ(C().Lbl_status->text(),
+              "Could not connect to http:// \u2014 URL using bad/illegal format");
+    EXPECT_EQ(C().Lst_Trace->count(), 3);
 }
 
 TEST_F(WindowStatesTest, FtpTraceFollowsTraceAloneAndItsStatusGoesToTheLabel) {

@@ -157,3 +157,12 @@ TEST(IniStore, FullDiskFailsAndKeepsTheSettingsFile) {
     EXPECT_EQ(disk.Read("quorvel.ini"), before);
     EXPECT_EQ(disk.Files(), QStringList{"quorvel.ini"});
 }
+
+TEST(LocalSettings, ManyKeysInOneWriteKeepEveryOtherLine) {
+    TempHome home;
+    const QByteArray before = "; mine\r\n[General]\r\nB=old\r\nOdd \xe9 line\r\n[Other]\r\nB=x\r\n";
+    LocalSettings settings(home.Write("s.ini", before));
+    ASSERT_TRUE(settings.SaveLocalSettings({{"A", "1"}, {"B", ""}, {"C", "3"}, {"A", "2"}}));
+    EXPECT_EQ(home.Read("s.ini"), QByteArray("; mine\r\n[General]\r\nB=Null\r\nOdd \xe9 line\r\n"
+                                             "A=2\r\nC=3\r\n[Other]\r\nB=x\r\n"));
+}

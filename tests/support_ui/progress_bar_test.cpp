@@ -36,6 +36,19 @@ protected:
     CProgress bar;
 };
 
+// Before anything is shown the display looks idle: no coloured area at all.
+TEST_F(ProgressBarTest, AnIdleDisplayShowsNoColouredBar) {
+    for (const bool initialised : {false, true}) {
+        if (initialised) bar.Initialise(1000, 1, QStringLiteral("bytes"));
+        const QImage image = Render();
+        for (const int x : {1, kWidth / 2, kWidth - 2})
+            EXPECT_EQ(QColor(image.pixel(x, kHeight / 2)), bar.palette().color(QPalette::Window))
+                << x << (initialised ? " initialised" : "");
+    }
+    bar.Show(0, QStringLiteral("site1.dat"));
+    EXPECT_EQ(BottomPixel(kWidth / 2), CProgress::kBackColour);
+}
+
 TEST_F(ProgressBarTest, CentredCaptionIsWhiteOnlyOverAQuarterBar) {
     bar.Initialise(1000, 1, QStringLiteral("bytes"));
     bar.Show(250, QStringLiteral("WWWWWWWWWWWWWWWWWWWW"));

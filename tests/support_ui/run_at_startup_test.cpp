@@ -71,6 +71,10 @@ TEST(AutostartEntryTest, ProgramPathsAreQuotedAndEscaped) {
     EXPECT_EQ(exec("/opt/q/quorvel"), "/opt/q/quorvel /S");
     EXPECT_EQ(exec("/opt/My Apps/q\"uo$rvel"), "\"/opt/My Apps/q\\\\\"uo\\\\$rvel\" /S");
     EXPECT_EQ(exec("/opt/100%/quorvel"), "/opt/100%%/quorvel /S");
+    // Each argument on its own: a home with a blank stays one argument.
+    const QString text = AutostartEntryText("q", "/opt/q/quorvel", {"/S", "--home", "/my data/q"});
+    EXPECT_TRUE(text.contains("\nExec=/opt/q/quorvel /S --home \"/my data/q\"\n"))
+        << text.toStdString();
 }
 
 } // namespace

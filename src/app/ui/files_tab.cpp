@@ -67,12 +67,13 @@ QGroupBox* BuildDownloadFrame(WindowControls& c, QWidget* page) {
     c.Txt_FileDateLocal = MakeEdit(QStringLiteral("Txt_FileDateLocal"), c.Frame_Download);
     c.Txt_FileDate->setToolTip(QStringLiteral("Date of the file at the web site"));
     c.Txt_FileDateLocal->setToolTip(QStringLiteral("Date of the copy on this PC"));
+    // Each date beside its pair of rules: the frame stays three rows high.
     for (auto* date : {c.Txt_FileDate, c.Txt_FileDateLocal})
-        date->setMinimumWidth(150);
-    grid->addWidget(MakeLabel(QStringLiteral("List:"), c.Frame_Download), 2, 0);
-    grid->addWidget(c.Txt_FileDate, 2, 1);
-    grid->addWidget(MakeLabel(QStringLiteral("Local:"), c.Frame_Download), 3, 0);
-    grid->addWidget(c.Txt_FileDateLocal, 3, 1);
+        date->setMinimumWidth(120);
+    grid->addWidget(MakeLabel(QStringLiteral("List:"), c.Frame_Download), 0, 2);
+    grid->addWidget(c.Txt_FileDate, 0, 3);
+    grid->addWidget(MakeLabel(QStringLiteral("Local:"), c.Frame_Download), 1, 2);
+    grid->addWidget(c.Txt_FileDateLocal, 1, 3);
     return c.Frame_Download;
 }
 
@@ -182,6 +183,9 @@ QLayout* BuildFileStatusRows(WindowControls& c, QWidget* page) {
         grid->addWidget(c.chk_ShowDate[i], i, 4);
     }
     grid->setColumnStretch(1, 1);
+    // The labels never ask for room by their text, so the grid keeps theirs.
+    grid->setColumnMinimumWidth(1, 200);
+    grid->setColumnMinimumWidth(3, 150);
     return grid;
 }
 

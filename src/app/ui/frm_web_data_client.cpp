@@ -3,15 +3,19 @@
 #include "app/app_services.h"
 #include "app/run/run_engine.h"
 #include "app/run/run_lock.h"
+#include "app/ui/desktop_identity.h"
 #include "app/ui/route_view.h"
 #include "app/ui/window_displays.h"
 #include "app/ui/window_run.h"
 #include "app/ui/window_scheduler.h"
+#include "app/ui/window_tray.h"
 #include "support/program_home.h"
 #include "support/ui/list_ops.h"
 #include "support/ui/progress_bar.h"
 
 #include <QFileDialog>
+#include <QGuiApplication>
+#include <QMessageBox>
 #include <QRadioButton>
 
 namespace quorvel {
@@ -39,6 +43,20 @@ FileDialogs FileDialogs::System() {
         dialog.setDefaultSuffix(QStringLiteral("txt"));
         return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles().value(0) : QString();
     };
+    dialogs.saveChanges = [](QWidget* owner, const QString& listName) {
+        QMessageBox box(
+            QMessageBox::Warning, QGuiApplication::applicationDisplayName(),
+            listName.isEmpty()
+                ? QStringLiteral("The new file list has not been saved.")
+                : QStringLiteral("The file list %1 has changes that are not saved.").arg(listName),
+            QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, owner);
+        box.setInformativeText(QStringLiteral("Save them before you go on?"));
+        box.setDefaultButton(QMessageBox::Save);
+        return box.exec();
+    };
+    dialogs.about = [](QWidget* owner, const QString& title, const QString& text) {
+        QMessageBox::about(owner, title, text);
+    };
     return dialogs;
 }
 
@@ -46,6 +64,8 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     : QMainWindow(parent), scheduledStart_(HasScheduleSwitch(arguments)),
       settings_(ProgramHome::SettingsFile()), dialogs_(FileDialogs::System()) {
     setObjectName(QStringLiteral("frm_WebDataClient"));
+    // Every box and dialog of the program carries its title and icon.
+    ApplyDesktopIdentity(QString::fromLatin1(kApplicationTitle));
     setWindowTitle(QStringLiteral("Quorvel"));
     BuildWindowControls(this, c_);
     for (auto* picture : c_.Pic_Route)
@@ -59,9 +79,12 @@ frm_WebDataClient::frm_WebDataClient(QStringList arguments, QWidget* parent)
     run_ = std::make_unique<WindowRun>(*this);
     scheduler_ = std::make_unique<WindowScheduler>(*this);
     engine_->CalculateNextProcessDue = [this] { scheduler_->CalculateNextProcessDue(); };
+    tray_ = std::make_unique<WindowTray>(*this, *scheduler_);
     ConnectHandlers();
+    ConnectSessionEnd();
     InstallDropTargets();
-    resize(1000, 800);
+    setMinimumSize(760, 540); // below this the editor has no room left to work in
+    resize(FirstSize());
 }
 
 frm_WebDataClient::~frm_WebDataClient() = default;
@@ -71,6 +94,12 @@ CTALUWebData& frm_WebDataClient::WebData() {
 }
 
 RunSummary frm_WebDataClient::Process(int which) {
+    // A command never starts while another one waits for its reply: the run
+    // starts when the wait is over.
+    if (refreshing_) {
+        processAfterRefresh_ = which;
+        return {};
+    }
     return engine_->Process(which, *run_, *run_);
 }
 

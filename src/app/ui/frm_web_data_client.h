@@ -31,6 +31,7 @@ class FtpDisplay;
 class RunEngine;
 class RunLock;
 class WindowRun;
+class WindowTray;
 class WindowScheduler;
 struct AppSettings;
 struct RunSummary;
@@ -66,6 +67,11 @@ struct FileDialogs {
     std::function<QString(QWidget*, const QString& title, const QString& start,
                           const QString& filter)>
         saveFile;
+    // The list has changes that are not saved: QMessageBox::Save, Discard or
+    // Cancel. listName is the list's file name, empty for a new list.
+    std::function<int(QWidget*, const QString& listName)> saveChanges;
+    // A box that only informs (About).
+    std::function<void(QWidget*, const QString& title, const QString& text)> about;
     static FileDialogs System();
 };
 
@@ -107,6 +113,8 @@ public:
     // its last date and, when asked for, the copy at the service).
     void EnableControls();
     void RefreshFileStatus();
+    // True while RefreshFileStatus waits for the service.
+    bool RefreshingFileStatus() const { return refreshing_; }
     void AddTrace(const QString& text) override;
     void ShowStatus(const QString& text) override;
     bool ShowError(const QString& where, const QString& description);
@@ -118,6 +126,14 @@ public:
     bool LoadDataFile(const QString& path);
     void LoadFilesListBox();
     bool SaveFileList();
+    // Before the list in memory is replaced or the window closes: true when
+    // nothing is unsaved, or it was saved, or the user let it go. Asks Save /
+    // Discard / Cancel; an unattended window saves without asking.
+    bool ConfirmUnsavedList();
+    // Writes the list to its file, asking for a name when it has none (and
+    // mayAsk); false when it was not written (cancelled or failed, after the
+    // report).
+    bool SaveListNow(bool mayAsk = true);
     // Writes the list when it changed; the error instead of a report.
     std::optional<AppError> SaveChangedList();
     bool StoreCurrentRecord();
@@ -143,6 +159,9 @@ public:
     void AddToRecentFiles(const QString& fileName);
     void mnu_File_Click(int index);
     void mnu_RecentFile_Click(int index);
+    void mnu_About_Click();
+    // The version and where the program keeps its files.
+    static QString AboutText();
 
     // The folder fields as the location rules take them.
     LocationFolders Folders() const;
@@ -157,6 +176,7 @@ public:
     RunEngine& Engine() { return *engine_; }
     // Timer1 and the schedule labels; NextDue() is the next automatic run.
     WindowScheduler& Scheduler() { return *scheduler_; }
+    WindowTray& Tray() { return *tray_; }
 
     WindowControls& Controls() { return c_; }
     const WindowControls& Controls() const { return c_; }
@@ -164,8 +184,14 @@ public:
     const FileList& Files() const { return files_; }
     const RecentFiles& Recent() const { return recent_; }
     int CurrentRecordNumber() const { return currentRecord_; }
+    // The list entry the list highlights, -1 for none: the record operations
+    // act on it, and without one there is no current record.
+    int SelectedRow() const;
     bool StartedMinimised() const { return scheduledStart_; }
     void SetFileDialogs(FileDialogs dialogs) { dialogs_ = std::move(dialogs); }
+    // The command line of the start at log-on: "/S", and "--home DIR" when the
+    // program's home is not the one it would find by itself.
+    static QStringList StartupArguments();
 
 protected:
     void closeEvent(QCloseEvent* event) override;
@@ -183,14 +209,24 @@ private:
     void InstallDropTargets();
 
     // Lifecycle details.
+    // The size the window opens with, and the first share of its splitters.
+    QSize FirstSize() const;
+    void FirstSplit();
     bool AccountSteps(bool& listFromService);
     void ApplySettings(const AppSettings& values);
     AppSettings CurrentSettings() const;
     void Form_QueryUnload(bool& cancel);
+    // Nobody may be there to answer: started with "/S" or the session ends.
+    bool Unattended() const { return scheduledStart_ || sessionEnding_; }
+    // Where an unattended window puts a list that has no file (or whose file
+    // cannot be written), so that it is never dropped.
+    bool RescueList();
+    void ConnectSessionEnd();
     void Form_Unload();
     void NoteActivation(QEvent* event);
 
     // States details.
+    void RefreshFileStatusOnce();
     void ShowLocalStatus(const LocationPath& full);
     void ShowRemoteStatus(const LocationPath& full);
     void PlotRouteLines();
@@ -227,7 +263,15 @@ private:
     RecentFiles recent_;
     int currentRecord_ = 0; // record number shown in the fields, 0 for none
     bool scheduledStart_ = false;
+    bool sessionEnding_ = false;
+    // RefreshFileStatus may wait for the service; a selection during that wait
+    // asks for another refresh instead of starting an exchange inside it, and
+    // a run asked for meanwhile starts when the wait is over.
+    bool refreshing_ = false;
+    bool refreshAgain_ = false;
+    std::optional<int> processAfterRefresh_;
     bool activated_ = false;
+    bool split_ = false; // the splitters got their first share
     bool reactivate_ = false;
     LocalSettings settings_;
     FileDialogs dialogs_;
@@ -237,6 +281,7 @@ private:
     std::unique_ptr<RunEngine> engine_;
     std::unique_ptr<WindowRun> run_;
     std::unique_ptr<WindowScheduler> scheduler_;
+    std::unique_ptr<WindowTray> tray_;
 };
 
 // True when the arguments hold "/S" in any letter case.

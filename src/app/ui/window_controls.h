@@ -3,6 +3,7 @@
 // them once (BuildWindowControls) and its procedures reach them through here.
 
 #include "app/ui/option_buttons.h"
+#include "support/ui/hint_list.h"
 
 #include <QAction>
 #include <QCheckBox>
@@ -18,6 +19,7 @@
 #include <array>
 
 class QMainWindow;
+class QSplitter;
 
 namespace quorvel {
 
@@ -25,6 +27,7 @@ class CProgress;
 class RouteView;
 
 struct WindowControls {
+    QSplitter* Spl_Window = nullptr; // the editor and list above, runs and trace below
     QTabWidget* SSTab1 = nullptr;
 
     // "Main"
@@ -106,7 +109,7 @@ struct WindowControls {
     QPushButton* Cmd_GetCFG = nullptr;
 
     // Outside the tab strip
-    QListWidget* Lst_Files = nullptr;
+    HintList* Lst_Files = nullptr;            // says what to do while it is empty
     std::array<QPushButton*, 5> Cmd_DoFile{}; // 4 "Save" stands on "New Season"
     std::array<QPushButton*, 2> Cmd_Process{};
     QPushButton* Cmd_Cancel = nullptr;
@@ -121,9 +124,10 @@ struct WindowControls {
     CProgress* Pic_ProgressFTP = nullptr;
 
     // Menus
-    std::array<QAction*, 5> mnu_File{};
+    std::array<QAction*, 5> mnu_File{};       // New, Open, Save As, separator, Exit
+    QAction* mnu_SaveList = nullptr;          // Save: the list to its own file
     std::array<QAction*, 6> mnu_RecentFile{}; // 0 is the separator above the entries
-    std::array<QAction*, 1> mnu_Help{};
+    std::array<QAction*, 2> mnu_Help{};       // Contents, About
 };
 
 // Creates every control inside window (central widget and menu bar).

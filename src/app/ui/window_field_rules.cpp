@@ -38,7 +38,11 @@ void frm_WebDataClient::ConnectRecordHandlers() {
             [this](int index) { Opt_MethodID_Click(index); });
     connect(c_.Chk_Zip, &QCheckBox::stateChanged, this, [this] { Chk_Zip_Click(); });
     connect(c_.Cmb_TypeID, &QComboBox::currentIndexChanged, this, [this] { Cmb_TypeID_Click(); });
+    // The record shown follows what the list highlights: a click on the empty
+    // part of the list or a Ctrl+click clears the selection without moving the
+    // current row, and Ctrl+arrow moves the current row alone.
     connect(c_.Lst_Files, &QListWidget::currentRowChanged, this, [this] { Lst_Files_Click(); });
+    connect(c_.Lst_Files, &QListWidget::itemSelectionChanged, this, [this] { Lst_Files_Click(); });
 }
 
 void frm_WebDataClient::ShowTransferRules(const TransferRules& rules) {
@@ -52,7 +56,7 @@ void frm_WebDataClient::ShowTransferRules(const TransferRules& rules) {
 
 void frm_WebDataClient::Txt_Name_Change() {
     if (flags_.IsLoading) return;
-    if (auto* item = c_.Lst_Files->currentItem()) item->setText(c_.Txt_Name->text());
+    if (auto* item = c_.Lst_Files->item(SelectedRow())) item->setText(c_.Txt_Name->text());
     SetChanged();
 }
 
@@ -102,7 +106,7 @@ void frm_WebDataClient::Cmb_TypeID_Click() {
 }
 
 void frm_WebDataClient::Lst_Files_Click() {
-    if (flags_.IsLoading) return;
+    if (flags_.IsLoading || SelectedRow() + 1 == currentRecord_) return;
     // The states are derived once, when the next record is shown.
     StoreFields();
     ShowCurrentRecord();

@@ -7,6 +7,7 @@
 #include "support/shell_open.h"
 
 #include <QRadioButton>
+#include <QShortcut>
 
 namespace quorvel {
 
@@ -37,6 +38,19 @@ void frm_WebDataClient::ConnectWindowHandlers() {
     for (int which : {RunEngine::kProcessAll, RunEngine::kProcessFile})
         connect(c_.Cmd_Process[which], &QPushButton::clicked, this,
                 [this, which] { Cmd_Process_Click(which); });
+    // The Delete key on the list does what the "Delete" button does, when it may.
+    auto* remove =
+        new QShortcut(QKeySequence::Delete, c_.Lst_Files, nullptr, nullptr, Qt::WidgetShortcut);
+    connect(remove, &QShortcut::activated, this, [this] {
+        if (c_.Cmd_DoFile[kFileDelete]->isEnabled()) DoFile(kFileDelete);
+    });
+}
+
+QStringList frm_WebDataClient::StartupArguments() {
+    // Started at log-on, the program must find the same settings and list.
+    QStringList arguments{QStringLiteral("/S")};
+    if (!ProgramHome::IsDefault()) arguments << QStringLiteral("--home") << ProgramHome::Folder();
+    return arguments;
 }
 
 void frm_WebDataClient::Cmd_Process_Click(int which) {
@@ -55,7 +69,7 @@ void frm_WebDataClient::Chk_Trace_Click() {
 }
 
 void frm_WebDataClient::Chk_RunAtStartUp_Click() {
-    SetRunAtStartup(c_.Chk_RunAtStartUp->isChecked() ? 1 : 0, false, QStringLiteral("/S"));
+    SetRunAtStartup(c_.Chk_RunAtStartUp->isChecked() ? 1 : 0, false, StartupArguments());
 }
 
 void frm_WebDataClient::Cmd_ClearFiles_Click() {

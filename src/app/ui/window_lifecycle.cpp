@@ -6,6 +6,7 @@
 #include "app/ui/frm_web_data_client.h"
 #include "app/ui/window_displays.h"
 #include "app/ui/window_scheduler.h"
+#include "app/ui/window_tray.h"
 #include "support/date_value.h"
 #include "support/program_home.h"
 #include "support/run_at_startup.h"
@@ -19,6 +20,8 @@
 #include <QMessageBox>
 #include <QRadioButton>
 #include <QTimer>
+
+#include <utility>
 
 namespace quorvel {
 
@@ -61,16 +64,16 @@ void frm_WebDataClient::Form_Load() {
     SetBackground(c_.Lbl_UserName, kStatusHighlight);
     SetBackground(c_.Lst_Files, kStatusHighlight);
 
-    AppSettings values = AppSettings::Defaults(ProgramHome::Folder(), QDate::currentDate().year());
+    AppSettings values = AppSettings::Defaults(ProgramHome::Folder(), QDate::currentDate().year(),
+                                               ProgramHome::DefaultDataFolder());
     const auto error = values.Load(settings_);
     recent_ = values.recentFiles;
     ApplySettings(values);
-    if (error) {
+    // An unreadable value took its own default; the start goes on.
+    if (error)
         ShowError(error->where.isEmpty() ? QStringLiteral("Load") : error->where,
                   error->description);
-        return;
-    }
-    c_.Chk_RunAtStartUp->setChecked(GetRunAtStartup(false, QStringLiteral("/S")) != 0);
+    c_.Chk_RunAtStartUp->setChecked(GetRunAtStartup(false, StartupArguments()) != 0);
     ConfigureRecentFiles();
     c_.Lbl_Now->setText(FormatDate(NowValue(), QString::fromLatin1(kPatternLong)));
     recent_.SetEntry(1, values.loadedFile);
@@ -80,6 +83,7 @@ void frm_WebDataClient::Form_Load() {
     setWindowTitle(QString::fromLatin1(kApplicationTitle));
     EnableControls();
     RefreshFileStatus();
+    tray_->Refresh();
     flags_.IsLoading = false;
 }
 
@@ -121,6 +125,7 @@ AppSettings frm_WebDataClient::CurrentSettings() const {
     values.getFileList = IndexOf(c_.Opt_GetFileList);
     values.getLocalFolders = IndexOf(c_.Opt_GetLocalFolders);
     values.downloadOnly = CheckOf(c_.Chk_DownloadOnly);
+    values.recentFiles = recent_;
     return values;
 }
 
@@ -134,7 +139,13 @@ void frm_WebDataClient::Form_Activate() {
 bool frm_WebDataClient::Initialise() {
     BusyGuard busy(CurrentBusyPointer());
     bool listFromService = false;
-    const bool signedIn = AccountSteps(listFromService);
+    // Nothing to sign in with yet (a first start): the way there, not the
+    // failure of a fetch from an empty address.
+    const bool configured = !c_.Txt_CFG_URL->text().trimmed().isEmpty();
+    const bool signedIn = configured && AccountSteps(listFromService);
+    if (!configured)
+        ShowStatus(QStringLiteral("Welcome to Quorvel: enter the CFG file web address, your user "
+                                  "ID and password on the Main tab, then press Login."));
     // When the service cannot be reached (offline, no account yet) the list on
     // this PC still opens: the user's own list, or at start-up the copy of the
     // service's list saved by the last session. The failed step's reason stays
@@ -161,6 +172,11 @@ void frm_WebDataClient::Form_QueryUnload(bool& cancel) {
         cancel = true;
         return;
     }
+    // Unsaved changes: saved, let go, or the window stays open.
+    if (!ConfirmUnsavedList()) {
+        cancel = true;
+        return;
+    }
     services_->CloseFtp();
     SaveFileList();
 }
@@ -174,6 +190,11 @@ void frm_WebDataClient::Form_Unload() {
 }
 
 void frm_WebDataClient::closeEvent(QCloseEvent* event) {
+    if (tray_->KeepRunningOnClose()) {
+        hide();
+        event->ignore();
+        return;
+    }
     bool cancel = false;
     Form_QueryUnload(cancel);
     if (cancel) {
@@ -181,11 +202,13 @@ void frm_WebDataClient::closeEvent(QCloseEvent* event) {
         return;
     }
     Form_Unload();
+    tray_->Closed();
     event->accept();
 }
 
 void frm_WebDataClient::showEvent(QShowEvent* event) {
     QMainWindow::showEvent(event);
+    if (!std::exchange(split_, true)) FirstSplit();
     // The first showing counts as the first activation, also where no window
     // manager ever activates the window.
     if (!activated_)

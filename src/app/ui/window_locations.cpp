@@ -54,7 +54,7 @@ bool frm_WebDataClient::AcceptsListDrop(const QMimeData* data) const {
 }
 
 bool frm_WebDataClient::AcceptsFileNameDrop(const QMimeData* data) const {
-    return !DroppedFiles(data).isEmpty() && c_.Lst_Files->currentRow() >= 0;
+    return !DroppedFiles(data).isEmpty() && SelectedRow() >= 0;
 }
 
 void frm_WebDataClient::DropOnList(const QMimeData* data) {

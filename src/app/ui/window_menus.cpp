@@ -1,6 +1,7 @@
 // The File menu with its recent file lists, and the Help menu.
 
 #include "app/ui/frm_web_data_client.h"
+#include "support/program_home.h"
 
 #include <QDir>
 
@@ -24,8 +25,22 @@ void frm_WebDataClient::ConnectMenus() {
     for (int i = 1; i <= RecentFiles::kEntries; ++i)
         connect(c_.mnu_RecentFile[i], &QAction::triggered, this,
                 [this, i] { mnu_RecentFile_Click(i); });
+    connect(c_.mnu_SaveList, &QAction::triggered, this, [this] { SaveListNow(); });
     // "&Contents" has no help file to open yet.
     c_.mnu_Help[0]->setEnabled(false);
+    connect(c_.mnu_Help[1], &QAction::triggered, this, [this] { mnu_About_Click(); });
+}
+
+QString frm_WebDataClient::AboutText() {
+    return QStringLiteral("<p><b>Quorvel %1</b></p>"
+                          "<p>Keeps the files of your data loggers and weather stations in step "
+                          "with your account on the web service.</p>"
+                          "<p>Settings, logs and the file list: %2</p>")
+        .arg(QStringLiteral(QUORVEL_VERSION), ProgramHome::Folder().toHtmlEscaped());
+}
+
+void frm_WebDataClient::mnu_About_Click() {
+    dialogs_.about(this, QStringLiteral("About"), AboutText());
 }
 
 void frm_WebDataClient::ConfigureRecentFiles() {
@@ -47,7 +62,9 @@ void frm_WebDataClient::mnu_File_Click(int index) {
     StoreCurrentRecord();
     switch (index) {
     case 0: {
+        if (!ConfirmUnsavedList()) break;
         files_.Clear();
+        files_.ListChanged = false;
         currentRecord_ = 0;
         const bool loading = flags_.IsLoading;
         flags_.IsLoading = true;
@@ -61,7 +78,8 @@ void frm_WebDataClient::mnu_File_Click(int index) {
     case 1: {
         const QString chosen = dialogs_.openFile(this, QStringLiteral("Open file list"),
                                                  files_.LoadedFile, kListFilter);
-        if (!chosen.isEmpty()) OpenFileList(QDir::toNativeSeparators(chosen));
+        if (!chosen.isEmpty() && ConfirmUnsavedList())
+            OpenFileList(QDir::toNativeSeparators(chosen));
         break;
     }
     case 2: {
@@ -83,7 +101,7 @@ void frm_WebDataClient::mnu_File_Click(int index) {
 }
 
 void frm_WebDataClient::mnu_RecentFile_Click(int index) {
-    if (!recent_.Entry(index).isEmpty()) OpenFileList(recent_.Entry(index));
+    if (!recent_.Entry(index).isEmpty() && ConfirmUnsavedList()) OpenFileList(recent_.Entry(index));
 }
 
 } // namespace quorvel

@@ -37,6 +37,10 @@ void SetCheckValue(QCheckBox* box, int value) {
 
 } // namespace
 
+int frm_WebDataClient::SelectedRow() const {
+    return ListSelectedRow(c_.Lst_Files);
+}
+
 bool frm_WebDataClient::LoadDataFile(const QString& path) {
     // The fields no longer belong to any record of the list that replaces this one.
     currentRecord_ = 0;
@@ -65,6 +69,9 @@ bool frm_WebDataClient::OpenFileList(const QString& path) {
 }
 
 std::optional<AppError> frm_WebDataClient::SaveChangedList() {
+    // A new list has no file yet: it waits for the name the user is asked
+    // for when it is replaced or the window closes, instead of failing here.
+    if (files_.LoadedFile.isEmpty()) return std::nullopt;
     return files_.SaveFileList(Folders());
 }
 
@@ -112,9 +119,12 @@ void frm_WebDataClient::ShowLocalDate(int index, const QString& date) {
 }
 
 void frm_WebDataClient::ShowCurrentRecord() {
-    {
+    if (SelectedRow() < 0) {
+        // Nothing selected: no current record, and fields that show none.
+        ClearRecordFields();
+    } else {
         LoadingScope loading(flags_.IsLoading);
-        currentRecord_ = c_.Lst_Files->currentRow() + 1;
+        currentRecord_ = SelectedRow() + 1;
         const FileRecord& r = RecordAt(currentRecord_);
         SetCheckValue(c_.Chk_Active, r.Active);
         c_.Txt_Name->setText(r.Name);
@@ -129,8 +139,8 @@ void frm_WebDataClient::ShowCurrentRecord() {
         c_.Txt_Folder->setText(r.Folder);
         c_.Txt_FileDate->setText(r.FileDate);
         c_.Txt_FileDateLocal->setText(r.FileDateLocal);
-        flags_.RecordEdited = false;
     }
+    flags_.RecordEdited = false;
     EnableControls();
     RefreshFileStatus();
 }
@@ -152,8 +162,7 @@ void frm_WebDataClient::ClearRecordFields() {
 void frm_WebDataClient::AddNewFileRecord(const QString& path) {
     // The fields go back into their record before the numbers move.
     StoreCurrentRecord();
-    const int index =
-        quorvel::AddNewFileRecord(files_, Folders(), path, c_.Lst_Files->currentRow());
+    const int index = quorvel::AddNewFileRecord(files_, Folders(), path, SelectedRow());
     if (index < 0) {
         ShowError(QStringLiteral("AddNewFileRecord"),
                   QStringLiteral("The file list is full (%1 files)").arg(FileList::kMaxRecords));
@@ -170,7 +179,7 @@ void frm_WebDataClient::DoFile(int index) {
     ConfigureClass();
     if (!StoreCurrentRecord()) return;
     LoadingScope loading(flags_.IsLoading);
-    const int row = c_.Lst_Files->currentRow();
+    const int row = SelectedRow();
     switch (index) {
     case kFileNew: {
         const QStringList chosen = dialogs_.openFiles(

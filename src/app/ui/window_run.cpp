@@ -82,7 +82,7 @@ int WindowRun::ActiveCount() const {
 }
 
 int WindowRun::CurrentEntry() const {
-    return window_.Controls().Lst_Files->currentRow();
+    return window_.SelectedRow();
 }
 
 FileRecord WindowRun::BeginFile(int index) {

@@ -14,6 +14,9 @@
 #include <QApplication>
 #include <QFileInfo>
 #include <QRadioButton>
+#include <QRegularExpression>
+
+#include <utility>
 
 namespace quorvel {
 
@@ -36,6 +39,26 @@ void SetEnabled(std::initializer_list<QWidget*> widgets, bool enabled) {
         w->setEnabled(enabled);
 }
 
+// The lines of a text joined into one, for a label one line high.
+QString OneLine(const QString& text) {
+    if (!text.contains(QLatin1Char('\n')) && !text.contains(QLatin1Char('\r'))) return text;
+    QStringList lines =
+        text.split(QRegularExpression(QStringLiteral("[\r\n]+")), Qt::SkipEmptyParts);
+    for (QString& line : lines)
+        line = line.trimmed();
+    return lines.join(QStringLiteral(" \u2014 "));
+}
+
+// What an empty file list tells the user to do next.
+QString EmptyListHint(bool listFromUser) {
+    if (listFromUser)
+        return QStringLiteral("No data files in this list yet.\n\nPress New to choose them, "
+                              "or drag them here from your file manager.");
+    return QStringLiteral("No file list yet.\n\nLog in on the Main tab to get the list kept "
+                          "for you at the web site, or choose \"File list from... User\" on the "
+                          "Files tab to make your own.");
+}
+
 } // namespace
 
 void frm_WebDataClient::EnableControls() {
@@ -45,7 +68,7 @@ void frm_WebDataClient::EnableControls() {
     in.busy = engine_->IsBusy();
     in.support = c_.Chk_Trace->isChecked();
     in.recordEdited = flags_.RecordEdited;
-    in.selected = c_.Lst_Files->currentRow();
+    in.selected = SelectedRow();
     in.count = c_.Lst_Files->count();
     const ControlStates s = DeriveControlStates(in);
 
@@ -55,9 +78,11 @@ void frm_WebDataClient::EnableControls() {
                 c_.Txt_Folder, c_.Cmb_TypeID},
                s.recordFields);
     c_.Lst_Files->setEnabled(s.fileList);
-    for (int i = 0; i < 4; ++i) {
-        c_.mnu_File[i]->setVisible(s.fileMenu);
-        c_.mnu_File[i]->setEnabled(s.fileMenuEnabled);
+    c_.Lst_Files->SetEmptyHint(EmptyListHint(in.listFromUser));
+    for (QAction* entry :
+         {c_.mnu_File[0], c_.mnu_File[1], c_.mnu_File[2], c_.mnu_File[3], c_.mnu_SaveList}) {
+        entry->setVisible(s.fileMenu);
+        entry->setEnabled(s.fileMenuEnabled);
     }
     ConfigureRecentFiles();
     for (int i = 1; i <= RecentFiles::kEntries; ++i)
@@ -93,7 +118,26 @@ void frm_WebDataClient::EnableControls() {
 }
 
 void frm_WebDataClient::RefreshFileStatus() {
-    if (c_.Lst_Files->currentRow() < 0) {
+    // Asking the service waits for its reply in the event loop. A selection
+    // made meanwhile never starts a second exchange inside the first: it asks
+    // for one more refresh, which shows the latest selection when the wait is
+    // over.
+    if (refreshing_) {
+        refreshAgain_ = true;
+        return;
+    }
+    refreshing_ = true;
+    do {
+        refreshAgain_ = false;
+        RefreshFileStatusOnce();
+    } while (refreshAgain_);
+    refreshing_ = false;
+    if (const auto which = std::exchange(processAfterRefresh_, std::nullopt))
+        Cmd_Process_Click(*which);
+}
+
+void frm_WebDataClient::RefreshFileStatusOnce() {
+    if (currentRecord_ == 0) {
         for (int i = 0; i < 2; ++i) {
             c_.Lbl_FullFilename[i]->clear();
             SetFileStatus(c_.Lbl_FileStatus[i], QString(), false);
@@ -105,7 +149,7 @@ void frm_WebDataClient::RefreshFileStatus() {
     // exchange itself and the service is busy with it. Both are looked at
     // again when the run ends.
     const bool running = engine_->IsBusy();
-    for (int i = 0; i < 2; ++i) {
+    for (int i = 0; i < 2 && !refreshAgain_; ++i) {
         const LocationPath full = FullFilename(i);
         c_.Lbl_FullFilename[i]->setText(full.ok() ? full.path : full.refusal);
         c_.Lbl_FullFilename[i]->setToolTip(c_.Lbl_FullFilename[i]->text());
@@ -119,6 +163,8 @@ void frm_WebDataClient::RefreshFileStatus() {
                                             SelectedTypeID(), c_.chk_ShowDate[i]->isChecked())
                 : QString());
     }
+    // A selection during a wait above: the next pass shows that one.
+    if (refreshAgain_) return;
     ShowLocalStatus(FullFilename(kOnThisPc));
     if (!running)
         ShowRemoteStatus(FullFilename(kAtService));
@@ -169,14 +215,17 @@ void frm_WebDataClient::AddTrace(const QString& text) {
 
 void frm_WebDataClient::ShowStatus(const QString& text) {
     AddTrace(QStringLiteral("Status>") + text);
-    if (engine_->IsBusy() && !text.isEmpty() && !c_.Lbl_status->text().isEmpty()) {
+    // The label is one line high: a text of several lines is shown as one.
+    const QString line = OneLine(text);
+    if (engine_->IsBusy() && !line.isEmpty() && !c_.Lbl_status->text().isEmpty()) {
         // During a run the exchanges report several texts a file: the label
         // keeps its colour and is drawn at the window's pace.
-        c_.Lbl_status->setText(text);
+        c_.Lbl_status->setText(line);
     } else {
-        SetStatusLabel(c_.Lbl_status, text);
+        SetStatusLabel(c_.Lbl_status, line);
     }
-    if (isMinimized()) setWindowTitle(text);
+    c_.Lbl_status->setToolTip(line);
+    if (isMinimized()) setWindowTitle(line);
 }
 
 } // namespace quorvel

@@ -1,6 +1,7 @@
 #include "support/ui/list_ops.h"
 
 #include <QComboBox>
+#include <QItemSelectionModel>
 #include <QListWidget>
 
 #include <algorithm>
@@ -13,12 +14,6 @@ std::int32_t DataOf(const QVariant& data) {
     return data.isValid() ? data.toInt() : 0;
 }
 
-// The current row when its item is selected (what the user sees), else -1.
-int SelectedRow(const QListWidget* list) {
-    const QListWidgetItem* item = list->currentItem();
-    return item != nullptr && item->isSelected() ? list->currentRow() : -1;
-}
-
 int FindData(const QListWidget* list, std::int32_t value) {
     for (int row = 0; row < list->count(); ++row) {
         if (DataOf(list->item(row)->data(Qt::UserRole)) == value) return row;
@@ -26,7 +21,18 @@ int FindData(const QListWidget* list, std::int32_t value) {
     return -1;
 }
 
+int SelectedRow(const QListWidget* list) {
+    return ListSelectedRow(list);
+}
+
 } // namespace
+
+int ListSelectedRow(const QListWidget* list) {
+    const QListWidgetItem* item = list->currentItem();
+    if (item != nullptr && item->isSelected()) return list->currentRow();
+    const QModelIndexList rows = list->selectionModel()->selectedRows();
+    return rows.isEmpty() ? -1 : rows.first().row();
+}
 
 void ListAddItem(QListWidget* list, const QString& text, std::int32_t data) {
     const int selected = SelectedRow(list);

@@ -1,7 +1,9 @@
 #pragma once
 // Operations on the window's lists: each item carries a 32-bit number in
-// Qt::UserRole (its item data); "selected" is the current row while its item
-// is selected.
+// Qt::UserRole (its item data); "selected" is the item the list highlights,
+// which is not always the current one (Ctrl+arrow moves only the focus, and a
+// click on the empty part of the list leaves the current row without any
+// selection).
 
 #include <cstdint>
 
@@ -10,6 +12,9 @@ class QListWidget;
 class QString;
 
 namespace quorvel {
+
+// The row of the selected item; -1 when none is selected.
+int ListSelectedRow(const QListWidget* list);
 
 // Inserts the text before the selected item, or appends it when none is
 // selected; stores the data and selects the new item.

@@ -106,8 +106,15 @@ int CProgress::BarWidth() const {
 
 void CProgress::paintEvent(QPaintEvent*) {
     QPainter painter(this);
+    if (!shown_) {
+        // Nothing to show yet: an empty groove, not a coloured bar that looks busy.
+        painter.fillRect(rect(), palette().color(QPalette::Window));
+        painter.setPen(palette().color(QPalette::Mid));
+        painter.drawRect(rect().adjusted(0, 0, -1, -1));
+        return;
+    }
     painter.fillRect(rect(), kBackColour);
-    if (shown_) PaintBar(painter);
+    PaintBar(painter);
 }
 
 void CProgress::PaintBar(QPainter& painter) {
