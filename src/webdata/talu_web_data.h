@@ -222,6 +222,7 @@ private:
     bool waiting_ = false;            // a request waits for its reply
     bool closedWhileWaiting_ = false; // ... and the peer closed the connection
     bool reused_ = false;             // the request went over a connection kept from before
+    QString connectedTo_;             // host and port the open connection was made to
     std::int64_t replyBytes_ = 0;     // bytes received since the request
     // Progress of received records is drawn at most every few tens of milliseconds.
     std::int64_t recordsSinceProgress_ = 0;

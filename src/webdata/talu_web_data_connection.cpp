@@ -40,12 +40,20 @@ bool CTALUWebData::OpenConnection() {
         const ServiceAddress target = ParseServiceAddress(remoteHost_, remotePort_);
         if (socket_ && !ChooseEncryption(target)) return false;
         if (socket_ && socket_->State() == kSocketConnected) socket_->Refresh();
+        // A plain connection may serve another host text (the request names
+        // its host), but a secure one was verified for one name only: the
+        // request, and the password in it, must not go to that server when
+        // the text now names another.
+        if (socket_ && target.secure && socket_->State() == kSocketConnected &&
+            connectedTo_ != target.host + QLatin1Char(':') + QString::number(target.port))
+            socket_->Close();
         reused_ = socket_ && socket_->State() == kSocketConnected;
         if (socket_ && socket_->State() != kSocketConnected) {
             socket_->Close();
             stream_.Clear();
             socket_->SetRemotePort(target.port);
             socket_->SetRemoteHost(target.host);
+            connectedTo_ = target.host + QLatin1Char(':') + QString::number(target.port);
             socket_->Connect();
             ShowStatusText(QStringLiteral("Connecting to ") + remoteHost_);
             const QDateTime giveUp = NextDeadline();

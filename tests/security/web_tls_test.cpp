@@ -112,6 +112,20 @@ TEST_F(TlsServiceTest, APlainConnectionIsNeverReusedForAnHttpsAddressNorTheOther
     EXPECT_EQ(statuses.filter(QStringLiteral("Connecting to ")).size(), 3);
 }
 
+TEST_F(TlsServiceTest, ASecureConnectionServesOnlyTheServerItWasVerifiedFor) {
+    object.SetRemoteHost(web.Address(TlsSite::Good));
+    ASSERT_TRUE(object.Initialise()) << object.LastError().toStdString();
+    // The text now names another server: the open connection was verified
+    // for the first one only, so the request goes to the new one, whose
+    // certificate is then refused.
+    ShortGap();
+    object.SetRemoteHost(web.Address(TlsSite::Expired));
+    EXPECT_FALSE(object.Initialise());
+    EXPECT_TRUE(object.LastError().contains(QStringLiteral("The certificate has expired")))
+        << object.LastError().toStdString();
+    EXPECT_EQ(AccessCount(QStringLiteral("wd.php"), 1), 1) << AccessLog().toStdString();
+}
+
 TEST_F(TlsServiceTest, ASocketThatCannotSpeakTlsRefusesAnHttpsAddress) {
     TcpSocketControl plainOnly;
     object.MyWinsock(&plainOnly);
