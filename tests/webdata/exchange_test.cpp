@@ -201,24 +201,6 @@ TEST_F(WebDataTest, TheOpenConnectionServesNewHostsAndTheSameUserButNotANewUser)
     EXPECT_EQ(server.connections, 2);
 }
 
-TEST_F(WebDataTest, AConnectionTheServerEndsIsOpenedAnewForTheNextCommand) {
-    const std::vector<Reply> endings = {
-        {Send(kFolders), CloseConnection()},
-        // Announced, but not yet done when the next command starts.
-        {Send(HttpReply("a|b|c|d|e\r\nOK\r\n", "Connection: close\r\n"))}};
-    for (const Reply& ending : endings) {
-        server.Queue(ending);
-        server.Queue(kFolders);
-        ASSERT_TRUE(web.Initialise());
-        const int opened = server.connections;
-        ASSERT_TRUE(PumpUntil([&] { return socket.State() != kSocketConnected; }));
-        statuses.clear();
-        EXPECT_TRUE(web.Initialise());
-        EXPECT_EQ(server.connections, opened + 1);
-        EXPECT_TRUE(statuses.contains(QStringLiteral("Connecting to ") + server.HostPort()));
-    }
-}
-
 TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     const QByteArray head = "HTTP/1.1 200 OK\r\nContent-Length: 999\r\n\r\n";
     QueueNewData("OK 0", {Send(head + kTwoRecords), Pause(int(kGap.count()) + 200),
