@@ -196,18 +196,6 @@ TEST_F(Faults, AReusedConnectionClosedBeforeAnyReplyByteCarriesTheRequestOnceMor
     EXPECT_NE(web.LastError(), QStringLiteral("OK"));
 }
 
-TEST_F(Faults, AFailedCommandNeverKeepsAnEarlierCommandsText) {
-    server.Queue(kFolders);
-    ASSERT_TRUE(web.Initialise());
-    ASSERT_EQ(web.LastError(), QStringLiteral("OK"));
-    EXPECT_FALSE(web.Initialise()); // no answer at all
-    EXPECT_TRUE(web.LastError().contains(QStringLiteral("GETUSERFOLDERS")))
-        << web.LastError().toStdString();
-    web.SetRemoteHost(ScriptServer().HostPort()); // nobody listens
-    EXPECT_FALSE(web.Initialise());
-    EXPECT_TRUE(web.LastError().startsWith(QStringLiteral("*Not* connected to ")));
-}
-
 TEST_F(Faults, BytesThatArriveWhileABoxIsOpenInsideReplyProcessingAreProcessed) {
     const QList<QByteArray> records = MinuteRecords(300);
     const QByteArray reply = HttpReply(Joined(records) + "OK\r\n");
