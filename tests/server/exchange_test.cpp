@@ -136,34 +136,42 @@ TEST_F(ServiceTest, MissingLocalFileGetsEveryRecordAlsoWithoutDates) {
         }
 }
 
-TEST_F(ServiceTest, FileIsFoundInTheUserAndSeasonFolders) {
+TEST_F(ServiceTest, FilesAreFoundInTheUserAndSeasonFoldersAndOtherRequestsGetAReason) {
     service.PlaceFile(QStringLiteral("ann"), QStringLiteral("top.dat"),
                       "2006-05-01 10:00:00,1\r\n");
     service.PlaceFile(QStringLiteral("ann"), QStringLiteral("current/season.dat"),
                       "2006-05-01 11:00:00,1\r\n");
     service.PlaceFile(QStringLiteral("bob"), QStringLiteral("bobs.dat"),
                       "2006-05-01 12:00:00,1\r\n");
-    struct Row {
-        QString file;
-        int location;
-        QString answer;
+    const struct {
+        const char* query;
+        const char* answer;
+    } rows[] = {
+        {"cmd=GETLASTDATE&file=top.dat&dt=1&filelocation=2", "OK 2006-05-01 10:00:00\r\n"},
+        {"cmd=GETLASTDATE&file=top.dat&dt=1&filelocation=0", "OK 2006-05-01 10:00:00\r\n"},
+        {"cmd=GETLASTDATE&file=top.dat&dt=1&filelocation=3", "OK 2006-05-01 10:00:00\r\n"},
+        {"cmd=GETLASTDATE&file=season.dat&dt=1&filelocation=3", "OK 2006-05-01 11:00:00\r\n"},
+        {"cmd=GETLASTDATE&file=season.dat&dt=1&filelocation=1", "OK 2006-05-01 11:00:00\r\n"},
+        {"cmd=GETLASTDATE&file=season.dat&dt=1&filelocation=4", "OK 2006-05-01 11:00:00\r\n"},
+        {"cmd=GETLASTDATE&file=bobs.dat&dt=1&filelocation=2", "OK NO FILE\r\n"},
+        {"cmd=GETLASTDATE&file=top.dat&dt=1&filelocation=5", "NOK unknown file location \"5\"\r\n"},
+        {"cmd=GETDATA&file=top.dat&dt=9&filelocation=2&date=0", "NOK unknown data type \"9\"\r\n"},
+        {"cmd=GETDATA&file=top.dat&filelocation=2&date=0", "NOK unknown data type \"\"\r\n"},
+        {"cmd=GETDATA&file=top.dat&dt=1&filelocation=2&date=soon",
+         "NOK unreadable date \"soon\"\r\n"},
+        {"cmd=GETDATA&file=top.dat&dt=1&filelocation=2&date=2006-05-01%2009%3A59%3A59",
+         "2006-05-01 10:00:00,1\r\nOK\r\n"},
+        {"cmd=GETDATA&file=top.dat&dt=1&filelocation=2&date=2006-05-01%2010%3A00%3A00", "OK\r\n"},
+        {"cmd=SENDDATA&file=top.dat&dt=1&filelocation=2", "NOK unknown command SENDDATA\r\n"},
+        {"cmd=GETFOLDER", "NOK unknown command GETFOLDER\r\n"},
+        {"file=top.dat", "NOK no command\r\n"},
+        {"cmd=GETUSERFOLDERS&trace=on",
+         "php wd.php: GETUSERFOLDERS for ann\r\n/ann|current|/ann/current|/home/ann/loggers|Ann "
+         "Example\r\nOK\r\n"},
     };
-    const Row rows[] = {
-        {QStringLiteral("top.dat"), 2, QStringLiteral("OK 2006-05-01 10:00:00\r\n")},
-        {QStringLiteral("top.dat"), 0, QStringLiteral("OK 2006-05-01 10:00:00\r\n")},
-        {QStringLiteral("top.dat"), 3, QStringLiteral("OK 2006-05-01 10:00:00\r\n")},
-        {QStringLiteral("season.dat"), 3, QStringLiteral("OK 2006-05-01 11:00:00\r\n")},
-        {QStringLiteral("season.dat"), 1, QStringLiteral("OK 2006-05-01 11:00:00\r\n")},
-        {QStringLiteral("season.dat"), 4, QStringLiteral("OK 2006-05-01 11:00:00\r\n")},
-        {QStringLiteral("bobs.dat"), 2, QStringLiteral("OK NO FILE\r\n")},
-        {QStringLiteral("top.dat"), 5, QStringLiteral("NOK unknown file location \"5\"\r\n")},
-    };
-    for (const Row& row : rows) {
-        SCOPED_TRACE(row.file.toStdString() + " " + std::to_string(row.location));
-        EXPECT_EQ(Ask(AsAnn(QStringLiteral("cmd=GETLASTDATE&file=%1&dt=1&filelocation=%2")
-                                .arg(row.file)
-                                .arg(row.location))),
-                  row.answer);
+    for (const auto& row : rows) {
+        SCOPED_TRACE(row.query);
+        EXPECT_EQ(Ask(AsAnn(QLatin1String(row.query))), QLatin1String(row.answer));
     }
     // GETDATA of a file the user does not have says so plainly.
     EXPECT_FALSE(web.GetNewData(Local(QStringLiteral("bobs.dat")), 2, 1));

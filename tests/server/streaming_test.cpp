@@ -72,32 +72,5 @@ TEST_F(ServiceTest, RecordsReachTheClientWhateverTheFileLooksLike) {
     EXPECT_EQ(ReadLocal(QStringLiteral("fresh.dat")), a + "\r\n" + b + "\r\n" + c + "\r\n");
 }
 
-TEST_F(ServiceTest, RequestsTheClientCannotMakeAreAnsweredWithAReason) {
-    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("s.dat"), "2006-05-01 10:00:00,1\r\n");
-    struct Row {
-        const char* query;
-        const char* answer;
-    };
-    const Row rows[] = {
-        {"cmd=GETDATA&file=s.dat&dt=9&filelocation=2&date=0", "NOK unknown data type \"9\"\r\n"},
-        {"cmd=GETDATA&file=s.dat&filelocation=2&date=0", "NOK unknown data type \"\"\r\n"},
-        {"cmd=GETDATA&file=s.dat&dt=1&filelocation=2&date=soon",
-         "NOK unreadable date \"soon\"\r\n"},
-        {"cmd=GETDATA&file=s.dat&dt=1&filelocation=2&date=2006-05-01%2009%3A59%3A59",
-         "2006-05-01 10:00:00,1\r\nOK\r\n"},
-        {"cmd=GETDATA&file=s.dat&dt=1&filelocation=2&date=2006-05-01%2010%3A00%3A00", "OK\r\n"},
-        {"cmd=SENDDATA&file=s.dat&dt=1&filelocation=2", "NOK unknown command SENDDATA\r\n"},
-        {"cmd=GETFOLDER", "NOK unknown command GETFOLDER\r\n"},
-        {"file=s.dat", "NOK no command\r\n"},
-        {"cmd=GETUSERFOLDERS&trace=on",
-         "php wd.php: GETUSERFOLDERS for ann\r\n/ann|current|/ann/current|/home/ann/loggers|Ann "
-         "Example\r\nOK\r\n"},
-    };
-    for (const Row& row : rows) {
-        SCOPED_TRACE(row.query);
-        EXPECT_EQ(Ask(AsAnn(QLatin1String(row.query))), QLatin1String(row.answer));
-    }
-}
-
 } // namespace
 } // namespace quorvel::testing

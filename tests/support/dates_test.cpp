@@ -5,22 +5,16 @@
 
 using namespace quorvel;
 
-TEST(DateValue, CountsDaysFromTheEpoch) {
+TEST(DateValue, CountsDaysFromTheEpochPartsCarryOver) {
     EXPECT_DOUBLE_EQ(MakeDate(1899, 12, 30), 0.0);
     EXPECT_DOUBLE_EQ(MakeDate(1900, 1, 1), 2.0);
     EXPECT_DOUBLE_EQ(MakeDate(2024, 11, 1), 45597.0);
     EXPECT_DOUBLE_EQ(MakeDate(2024, 11, 1, 6, 0, 0), 45597.25);
-}
-
-TEST(DateValue, PartsCarryOver) {
     EXPECT_DOUBLE_EQ(MakeDate(2024, 13, 1), MakeDate(2025, 1, 1));
     EXPECT_DOUBLE_EQ(MakeDate(2024, 3, 0), MakeDate(2024, 2, 29));
     EXPECT_DOUBLE_EQ(MakeDate(2024, 0, 15), MakeDate(2023, 12, 15));
     EXPECT_DOUBLE_EQ(MakeDate(2024, 12, 31, 24, 0, 0), MakeDate(2025, 1, 1));
     EXPECT_DOUBLE_EQ(MakeDate(2024, 1, 1, 0, 90, 0), MakeDate(2024, 1, 1, 1, 30, 0));
-}
-
-TEST(DateValue, WholeDayAndTimeParts) {
     const DateValue v = MakeDate(2024, 11, 1, 18, 0, 0);
     EXPECT_DOUBLE_EQ(DatePart(v), 45597.0);
     EXPECT_DOUBLE_EQ(TimePart(v), 0.75);
@@ -30,7 +24,7 @@ TEST(DateValue, WholeDayAndTimeParts) {
     EXPECT_EQ(FormatDate(before, kPatternIso), QString("1899-12-29 06:00:00"));
 }
 
-TEST(DateFormat, EveryPatternTheProgramWrites) {
+TEST(DateFormat, EveryPatternTheProgramWritesRoundedToTheSecond) {
     const DateValue v = MakeDate(2024, 3, 5, 7, 8, 9);
     EXPECT_EQ(FormatDate(v, kPatternLong), QString("5 Mar 2024 07:08:09"));
     EXPECT_EQ(FormatDate(v, kPatternDue), QString("5 Mar 2024 07:08"));
@@ -39,9 +33,6 @@ TEST(DateFormat, EveryPatternTheProgramWrites) {
     EXPECT_EQ(FormatDate(v, kPatternHourMinute), QString("07:08"));
     EXPECT_EQ(FormatDate(v, kPatternHms), QString("07:08:09"));
     EXPECT_EQ(FormatDate(v, "HH:MM:Ss"), QString("07:08:09"));
-}
-
-TEST(DateFormat, RoundsToTheNearestSecond) {
     const DateValue almostMidnight = MakeDate(2024, 12, 31) + (86400.0 - 0.2) / 86400.0;
     EXPECT_EQ(FormatDate(almostMidnight, kPatternIso), QString("2025-01-01 00:00:00"));
 }
@@ -82,7 +73,7 @@ TEST(DateText, NumericFollowsTheGivenOrder) {
     EXPECT_FALSE(ParseDateText(u"1/2-2024", NumericDateOrder::DayFirst)); // mixed separators
 }
 
-TEST(DateText, MalformedTextsAreNoDate) {
+TEST(DateText, MalformedTextsAreNoDateAndDayFromTextDropsTheTime) {
     for (const char16_t* bad :
          {u"", u"never", u" -", u"12", u"2024-13-01", u"2024-02-30", u"31 Abc 2024",
           u"1 Nov 2024 25:00", u"1 Nov 2024 10:60", u"2024-11-01x", u"13:00 pm", u"1 No 2024"}) {
@@ -90,8 +81,5 @@ TEST(DateText, MalformedTextsAreNoDate) {
         EXPECT_DOUBLE_EQ(DateFromText(bad), 0.0);
         EXPECT_EQ(DayFromText(bad), 0);
     }
-}
-
-TEST(DateText, DayFromTextDropsTheTime) {
     EXPECT_EQ(DayFromText(u"1 Nov 2024 23:59:59"), 45597);
 }

@@ -23,7 +23,7 @@ QStringList LogLines() {
 
 } // namespace
 
-TEST(FileExists, FilesFoldersAndWildcards) {
+TEST(FileExists, FilesFoldersAndWildcardsButFolderExistsOnlyForFolders) {
     TempHome home;
     home.Write("logs/site1.dat", "x");
     home.Write("logs/site2.csv", "y");
@@ -37,10 +37,7 @@ TEST(FileExists, FilesFoldersAndWildcards) {
     EXPECT_FALSE(FileExists(""));
     // A "\" is a separator too.
     EXPECT_TRUE(FileExists(home.Path() + "\\logs\\site1.dat"));
-}
-
-TEST(FolderExists, OnlyFoldersCount) {
-    TempHome home;
+    // Only folders count as folders.
     home.Write("a/file.txt", "x");
     EXPECT_TRUE(FolderExists(home.File("a")));
     EXPECT_TRUE(FolderExists(home.File("a") + "/"));

@@ -33,52 +33,22 @@ TEST(IniStore, KeysAndSectionsIgnoreCase) {
     EXPECT_EQ(home.Read("s.ini"), QByteArray("[general]\r\nUSERID=xyz\r\n"));
 }
 
-TEST(IniStore, ReadsAtMost255Characters) {
+TEST(IniStore, LongValuesLineBreaksPermissionsAndMissingFolder) {
     TempHome home;
     IniStore ini(home.File("s.ini"));
     ASSERT_TRUE(ini.Write("General", "Long", QString(300, 'x')));
     EXPECT_EQ(ini.Read("General", "Long", "").size(), 255);
-}
-
-TEST(IniStore, OtherSectionsKeysAndCommentsSurviveAWrite) {
-    TempHome home;
-    const QByteArray before = "; my comment\n[Other]\nkeep=1\n\n[General]\nA=1\ngarbage line\n"
-                              "B=2\n\n[Tail]\nz=9\n";
-    const QString path = home.Write("s.ini", before);
-    IniStore ini(path);
-    ASSERT_TRUE(ini.Write("General", "A", "10"));
-    ASSERT_TRUE(ini.Write("General", "C", "3"));
-    ASSERT_TRUE(ini.Write("New", "n", "v"));
-    EXPECT_EQ(home.Read("s.ini"),
-              QByteArray("; my comment\n[Other]\nkeep=1\n\n[General]\nA=10\ngarbage line\n"
-                         "B=2\nC=3\n\n[Tail]\nz=9\n\n[New]\nn=v\n"));
-    EXPECT_EQ(ini.Read("Other", "keep", ""), QString("1"));
-    EXPECT_EQ(ini.Read("General", "garbage line", "d"), QString("d"));
-}
-
-TEST(IniStore, ValuesCannotBreakTheFile) {
-    TempHome home;
-    IniStore ini(home.File("s.ini"));
+    // A value cannot break the file.
     ASSERT_TRUE(ini.Write("General", "Password", "a\r\n[Evil]\r\nx=1"));
     ASSERT_TRUE(ini.Write("General", "Next", "2"));
     EXPECT_EQ(ini.Read("Evil", "x", "none"), QString("none"));
     EXPECT_EQ(ini.Read("General", "Next", ""), QString("2"));
-}
-
-TEST(IniStore, NewFileIsReadableByItsOwnerOnly) {
-    TempHome home;
-    IniStore ini(home.File("s.ini"));
-    ASSERT_TRUE(ini.Write("General", "Password", "secret"));
+    // A new file is readable by its owner only.
     const QFileDevice::Permissions p = QFileInfo(home.File("s.ini")).permissions();
     EXPECT_TRUE(p & QFileDevice::ReadOwner);
     EXPECT_FALSE(p & (QFileDevice::ReadGroup | QFileDevice::ReadOther | QFileDevice::WriteGroup |
                       QFileDevice::WriteOther));
-}
-
-TEST(IniStore, AWriteIntoAnUnwritableFolderFailsAndKeepsTheOldFile) {
-    TempHome home;
-    IniStore ini(home.File("missing-folder/s.ini"));
-    EXPECT_FALSE(ini.Write("General", "A", "1"));
+    EXPECT_FALSE(IniStore(home.File("missing-folder/s.ini")).Write("General", "A", "1"));
 }
 
 TEST(LocalSettings, NullMeansEmptyInAnyCase) {
@@ -92,10 +62,7 @@ TEST(LocalSettings, NullMeansEmptyInAnyCase) {
     EXPECT_EQ(settings.GetLocalSetting("B", "d"), QString());
     EXPECT_EQ(settings.GetLocalSetting("C", "d"), QString("Nullify"));
     EXPECT_EQ(settings.GetLocalSetting("Missing", "3 hrs"), QString("3 hrs"));
-}
-
-TEST(LocalSettings, EditedValueSurvivesANewReader) {
-    TempHome home;
+    // An edited value survives a new reader.
     ASSERT_TRUE(LocalSettings(home.File("q.ini")).SaveLocalSetting("Interval", "6 hours"));
     EXPECT_EQ(LocalSettings(home.File("q.ini")).GetLocalSetting("Interval", "3 hrs"),
               QString("6 hours"));

@@ -8,7 +8,6 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QTemporaryDir>
 
 #include <gtest/gtest.h>
 
@@ -39,26 +38,7 @@ TEST(ProgramLog, AnUnwritableLogIsReportedAndTheCallerGoesOn) {
     EXPECT_TRUE(ports.prompter.shown[0].message.endsWith("\r\n" + ProgramHome::LogFile()));
 }
 
-TEST(ProgramHome, HomeSwitchMovesSettingsAndLogs) {
-    QTemporaryDir dir;
-    QStringList args{"/S", "--home", dir.path(), "x"};
-    ProgramHome::Configure(args);
-    EXPECT_EQ(args, QStringList({"/S", "x"}));
-    EXPECT_EQ(ProgramHome::Folder(), QDir::toNativeSeparators(dir.path()));
-    EXPECT_EQ(ProgramHome::SettingsFile(), QDir::toNativeSeparators(dir.path()) +
-                                               QDir::separator() + ProgramHome::ProgramName() +
-                                               ".ini");
-    EXPECT_TRUE(ProgramHome::FtpLogFile().endsWith(QString(QDir::separator()) + "ftp.log"));
-
-    qputenv("QUORVEL_HOME", QFile::encodeName(dir.filePath("env")));
-    QStringList none;
-    ProgramHome::Configure(none);
-    EXPECT_EQ(ProgramHome::Folder(), QDir::toNativeSeparators(dir.filePath("env")));
-    qunsetenv("QUORVEL_HOME");
-    ProgramHome::SetFolder({});
-}
-
-TEST(ShellOpen, HandsExistingFilesToTheDesktop) {
+TEST(ShellOpen, HandsExistingFilesToTheDesktopAndNamesEachFailure) {
     TempHome home;
     RecordingPorts ports;
     QStringList opened;
@@ -67,17 +47,12 @@ TEST(ShellOpen, HandsExistingFilesToTheDesktop) {
     EXPECT_TRUE(ShellOpenFile(file));
     EXPECT_EQ(opened, QStringList{file});
     EXPECT_TRUE(ports.prompter.shown.empty());
-    SetDesktopOpener({});
-}
 
-TEST(ShellOpen, FailuresShowTheDescribedMessageAndTheFile) {
-    TempHome home;
-    RecordingPorts ports;
+    // Failures show the described message and the file.
     SetDesktopOpener([](const QString&) { return false; });
     EXPECT_FALSE(ShellOpenFile(home.File("missing.txt")));
     EXPECT_FALSE(ShellOpenFile(home.File("nofolder/missing.txt")));
-    const QString file = home.Write("data.xyz", "x");
-    EXPECT_FALSE(ShellOpenFile(file));
+    EXPECT_FALSE(ShellOpenFile(home.Write("data.xyz", "x")));
     ASSERT_EQ(ports.prompter.shown.size(), 3u);
     EXPECT_EQ(ports.prompter.shown[0].message,
               "File not found\r\nFile: " + QDir::toNativeSeparators(home.File("missing.txt")));

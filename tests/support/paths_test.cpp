@@ -4,7 +4,7 @@
 
 using namespace quorvel;
 
-TEST(Paths, NameAndFolderSplitAtEitherSeparator) {
+TEST(Paths, SplitsFullPathsTrailingSeparatorsAndSlashes) {
     EXPECT_EQ(GetFileName("C:\\data\\site1.dat"), QString("site1.dat"));
     EXPECT_EQ(GetFileName("/data/site1.dat"), QString("site1.dat"));
     EXPECT_EQ(GetFileName("C:\\data/sub\\x.txt"), QString("x.txt"));
@@ -15,18 +15,12 @@ TEST(Paths, NameAndFolderSplitAtEitherSeparator) {
     EXPECT_EQ(GetPath("plain.txt"), QString());
     EXPECT_EQ(GetFileNameFromURL("http://host/a/b/files.txt"), QString("files.txt"));
     EXPECT_EQ(GetFileNameFromURL("files.txt"), QString("files.txt"));
-}
-
-TEST(Paths, FullPathTest) {
     EXPECT_TRUE(IsFullPath("/home/user"));
     EXPECT_TRUE(IsFullPath("C:\\Data"));
     EXPECT_TRUE(IsFullPath("http://host/x"));
     EXPECT_TRUE(IsFullPath("\\\\server//share"));
     EXPECT_FALSE(IsFullPath("data\\site1.dat"));
     EXPECT_FALSE(IsFullPath(""));
-}
-
-TEST(Paths, TrailingSeparators) {
     EXPECT_EQ(AddTrailingSlash(""), QString());
     EXPECT_EQ(AddTrailingSlash("C:\\Data/"), QString("C:\\Data/"));
     EXPECT_EQ(AddTrailingSlash("C:\\Data\\"), QString("C:\\Data\\"));
@@ -35,9 +29,6 @@ TEST(Paths, TrailingSeparators) {
     EXPECT_EQ(RemoveTrailingSlash("/data/"), QString("/data"));
     EXPECT_EQ(RemoveTrailingSlash(""), QString());
     EXPECT_EQ(RemoveTrailingSlash("   "), QString());
-}
-
-TEST(Paths, SlashConversions) {
     EXPECT_EQ(ConvertSlashes("a\\b/c", true), QString("a/b/c"));
     EXPECT_EQ(ConvertSlashes("a\\b/c", false), QString("a\\b\\c"));
     const QString native = ToNativeSeparators("data\\sub/x.dat");

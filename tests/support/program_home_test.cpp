@@ -61,6 +61,13 @@ TEST_F(ProgramHomeTest, HomeSwitchWinsAndIsNotTheDefault) {
     EXPECT_EQ(ProgramHome::Folder(), exe.File("elsewhere"));
     EXPECT_FALSE(ProgramHome::IsDefault());
     EXPECT_EQ(ProgramHome::DefaultDataFolder(), exe.File("elsewhere"));
+    EXPECT_EQ(ProgramHome::FtpLogFile(), exe.File("elsewhere/ftp.log"));
+
+    qputenv("QUORVEL_HOME", QFile::encodeName(exe.File("env")));
+    QStringList none;
+    ProgramHome::Configure(none);
+    qunsetenv("QUORVEL_HOME");
+    EXPECT_EQ(ProgramHome::Folder(), exe.File("env"));
 }
 
 } // namespace

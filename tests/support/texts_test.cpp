@@ -4,7 +4,7 @@
 
 using namespace quorvel;
 
-TEST(DurationText, DaysHoursAndSeconds) {
+TEST(DurationText, DaysHoursAndSecondsAndAlmostAWholeDayIsAWholeDay) {
     EXPECT_EQ(DurationText(1.5), QString("1 day 12:00"));
     EXPECT_EQ(DurationText(2.25), QString("2 days 06:00"));
     EXPECT_EQ(DurationText(3 + (4 * 60 + 5) / 1440.0), QString("3 days 04:05"));
@@ -13,15 +13,12 @@ TEST(DurationText, DaysHoursAndSeconds) {
     EXPECT_EQ(DurationText((3600 + 5 * 60 + 9) / 86400.0), QString("01:05:09"));
     EXPECT_EQ(DurationText(50 / 1440.0), QString("00:50:00"));
     EXPECT_EQ(DurationText(7 / 86400.0), QString("00:00:07"));
-}
-
-TEST(DurationText, AlmostAWholeDayIsAWholeDay) {
     // Floating-point sums that fall a hair short of a day must not read "23:59:60".
     EXPECT_EQ(DurationText(1.0 - 1e-12), QString("1 day 00:00"));
     EXPECT_EQ(DurationText(2 / 24.0 - 1e-12), QString("02:00"));
 }
 
-TEST(ByteSize, StepsAtFiftyThousandOfEachUnit) {
+TEST(NumberPatterns, ByteSizesStepAtFiftyThousandThousandsAndPercent) {
     EXPECT_EQ(FormatByteSize(0), QString("0 b"));
     EXPECT_EQ(FormatByteSize(49999), QString("49,999 b"));
     EXPECT_EQ(FormatByteSize(50000), QString("50 Kb"));
@@ -30,9 +27,6 @@ TEST(ByteSize, StepsAtFiftyThousandOfEachUnit) {
     EXPECT_EQ(FormatByteSize(1073741824), QString("1,074 Mb"));
     EXPECT_EQ(FormatByteSize(50000000000), QString("50 Gb"));
     EXPECT_EQ(FormatByteSize(5000000000000), QString("5,000 Gb"));
-}
-
-TEST(NumberPatterns, ThousandsAndPercent) {
     EXPECT_EQ(FormatThousands(1234567.4), QString("1,234,567"));
     EXPECT_EQ(FormatThousands(999), QString("999"));
     EXPECT_EQ(FormatThousands(-1234), QString("-1,234"));
@@ -40,15 +34,12 @@ TEST(NumberPatterns, ThousandsAndPercent) {
     EXPECT_EQ(FormatPercent(1), QString("100%"));
 }
 
-TEST(Align, PadsAndCuts) {
+TEST(Align, PadsAndCutsAndStripNullCutsAtTheFirstNul) {
     EXPECT_EQ(AlignRight("ab", 5), QString("   ab"));
     EXPECT_EQ(AlignRight("abcdef", 3), QString("def"));
     EXPECT_EQ(AlignLeft("ab", 5), QString("ab   "));
     EXPECT_EQ(AlignLeft("abcdef", 3), QString("abc"));
     EXPECT_EQ(AlignLeft("ab", -1), QString());
-}
-
-TEST(StripNull, CutsAtTheFirstNul) {
     EXPECT_EQ(StripNull(QString("abc") + QChar(0) + "def"), QString("abc"));
     EXPECT_EQ(StripNull("abc"), QString("abc"));
     EXPECT_EQ(StripNull(QString(QChar(0))), QString());

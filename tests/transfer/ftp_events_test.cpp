@@ -20,7 +20,7 @@ protected:
     testing::RecordingProgressView progress;
 };
 
-TEST_F(FtpEventsTest, DownloadBeyondFourGigabytesCountsIn64Bits) {
+TEST_F(FtpEventsTest, DownloadBeyondFourGigabytesCountsIn64BitsAndNeverPastOneHundredPercent) {
     const std::int64_t total = (std::int64_t{5} << 30) + 7;
     report.Counters().currentFile = QStringLiteral("big.dat");
     report.ProgressStart(TransferState::Download, total, QStringLiteral("big.dat=>/tmp/big.dat"));
@@ -34,9 +34,8 @@ TEST_F(FtpEventsTest, DownloadBeyondFourGigabytesCountsIn64Bits) {
         view.traces.last().contains(QStringLiteral(":Downloading  5368709127 of 5368709127 ")));
     EXPECT_EQ(
         view.traces.filter(QStringLiteral("FTPProgress: 5368709127/5368709127 = 100%")).size(), 1);
-}
 
-TEST_F(FtpEventsTest, ProgressBeyondTheTotalHasNoPercentage) {
+    // Progress beyond the total has no percentage.
     EXPECT_EQ(PercentText(26, 25), QString());
     EXPECT_EQ(PercentText(5, 0), QString());
     EXPECT_EQ(PercentText(25, 100), QStringLiteral("25%"));

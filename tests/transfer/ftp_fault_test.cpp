@@ -152,8 +152,6 @@ TEST_P(FtpFaultTest, Case) {
 INSTANTIATE_TEST_SUITE_P(
     Faults, FtpFaultTest,
     ::testing::Values(
-        FaultCase{"PlainDownloadOverOneLogin", "[]", Op::Download, Join({kLogin, kFind, kGet}),
-                  true, "", kWhole},
         FaultCase{"DataConnectionDroppedAfter1000BytesKeepsTheOldCopy",
                   R"j([{"at": "RETR", "cut_after": 1000}])j",
                   Op::Download,

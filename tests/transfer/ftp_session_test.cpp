@@ -174,26 +174,6 @@ TEST_F(FtpSessionTest, FileGrowingDuringUploadIsSentAsItWasAtTheStart) {
     EXPECT_EQ(progress.initialised, 1);
 }
 
-TEST_F(FtpSessionTest, ServerStoppedDuringDownloadLeavesOldCopyAndReconnectsLater) {
-    const QByteArray data = RandomBytes(64 << 20);
-    Serve(QStringLiteral("big.dat"), data);
-    const QString local = home.Write(QStringLiteral("in/big.dat"), "old copy");
-    progress.onData = [this] { peer.Stop(); };
-
-    EXPECT_FALSE(session.Download(QStringLiteral("big.dat"), local));
-    EXPECT_TRUE(session.LastError().startsWith(QStringLiteral("FtpGetFile Error")));
-    EXPECT_EQ(Read(local), QByteArray("old copy"));
-    EXPECT_EQ(QDir(home.File(QStringLiteral("in"))).entryList(QDir::Files | QDir::Hidden),
-              QStringList{QStringLiteral("big.dat")});
-
-    const int port = peer.Port();
-    ASSERT_TRUE(peer.Start(root.path(), port));
-    EXPECT_TRUE(session.Download(QStringLiteral("big.dat"), local))
-        << session.LastError().toStdString();
-    EXPECT_EQ(Read(local), data);
-    EXPECT_EQ(peer.Logins(1), 1);
-}
-
 TEST_F(FtpSessionTest, RemoteFileBeyondFourGigabytesHasItsTrueSize) {
     const std::int64_t size = (std::int64_t{5} << 30) + 3;
     QFile sparse(OnServer(QStringLiteral("huge.dat")));

@@ -49,15 +49,13 @@ TEST_F(HttpFetchTest, BodyIsReadWhole) {
     EXPECT_EQ(ports.busy.depth, 0);
 }
 
-TEST_F(HttpFetchTest, HtmlReplyIsNotTheFile) {
+TEST_F(HttpFetchTest, AnHtmlReplyOrNotFoundIsNotTheFile) {
     Serve(QStringLiteral("cfg.txt"), "<html>ftp.example.com\r\n");
     EXPECT_FALSE(session.HttpGetFileContents(
         QStringLiteral("http://") + Host() + QStringLiteral("/cfg.txt"), contents));
     EXPECT_EQ(contents, QStringLiteral("<html>ftp.example.com\r\n"));
     EXPECT_EQ(view.traces.filter(QStringLiteral("found html tag, so file not there")).size(), 1);
-}
-
-TEST_F(HttpFetchTest, NotFoundWithPlainTextBodyIsAFailure) {
+    // Not found, with a plain text body.
     EXPECT_FALSE(session.HttpGetFileContents(
         QStringLiteral("http://") + Host() + QStringLiteral("/missing.txt"), contents));
     EXPECT_TRUE(contents.isEmpty());

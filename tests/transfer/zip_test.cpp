@@ -128,14 +128,11 @@ TEST_F(ZipTest, PatternPacksEveryMatchingFileButTheArchive) {
         kZipNothingToDo);
 }
 
-TEST_F(ZipTest, MissingAndCorruptArchivesGiveErrorCodes) {
+TEST_F(ZipTest, MissingCorruptOrDamagedArchivesGiveErrorCodesAndLeaveTheOlderCopy) {
     EXPECT_EQ(UnzipFile(dir.filePath(QStringLiteral("none.zip")), dir.path()), kZipNotFound);
     const QString junk = Write(QStringLiteral("junk.zip"), QByteArray(4096, 'x'));
     EXPECT_EQ(UnzipFile(junk, dir.path()), kZipCorrupt);
     EXPECT_TRUE(IsZipError(kZipCorrupt));
-}
-
-TEST_F(ZipTest, DamagedEntryLeavesTheOlderCopy) {
     const QString old = Write(QStringLiteral("out/site.dat"), "older copy");
     const QString archive = dir.filePath(QStringLiteral("site_dat.zip"));
     ASSERT_EQ(ZipFiles({Write(QStringLiteral("site.dat"), LoggerText(5000))}, archive), kZipOk);
@@ -166,25 +163,7 @@ TEST_F(ZipTest, EntryLeavingTheFolderRefusesTheArchive) {
               target + QStringLiteral("/sub/x.dat"));
 }
 
-TEST_F(ZipTest, EntriesInFoldersAreExtractedBelowTheTarget) {
-    const QString archive =
-        MakeArchive(QStringLiteral("tree.zip"), {{"sub/", ""}, {"sub/x.dat", "x"}});
-    EXPECT_EQ(UnzipFile(archive, dir.filePath(QStringLiteral("t"))), kZipOk);
-    EXPECT_EQ(Read(dir.filePath(QStringLiteral("t/sub/x.dat"))), QByteArray("x"));
-}
-
-TEST_F(ZipTest, DataFileInADottedFolderTravelsZipped) {
-    const QByteArray data = LoggerText(200);
-    const QString local = Write(QStringLiteral("first.last/site1.dat"), data);
-    const ZipStepResult zipped = ZipForUpload(local, nullptr);
-    EXPECT_EQ(zipped.code, kZipOk);
-    EXPECT_EQ(zipped.zipFile, dir.filePath(QStringLiteral("first.last/site1_dat.zip")));
-    Write(QStringLiteral("first.last/site1.dat"), "older");
-    EXPECT_EQ(UnzipAfterDownload(zipped.zipFile, nullptr), kZipOk);
-    EXPECT_EQ(Read(local), data);
-}
-
-TEST_F(ZipTest, ArchivesThatInfoZipAcceptsAreExtracted) {
+TEST_F(ZipTest, ArchivesThatInfoZipAcceptsAreExtractedFoldersAndAll) {
     const QByteArray data = LoggerText(3000);
     Write(QStringLiteral("src/site.dat"), data);
     // Written to a pipe: sizes and checksums follow each entry's data.
@@ -205,12 +184,17 @@ TEST_F(ZipTest, ArchivesThatInfoZipAcceptsAreExtracted) {
     EXPECT_EQ(Read(dir.filePath(QStringLiteral("d/site.dat"))), QByteArray("d"));
     EXPECT_EQ(SafeEntryPath(dir.filePath(QStringLiteral("d")), QStringLiteral("./")),
               dir.filePath(QStringLiteral("d")) + QStringLiteral("/"));
+    // Entries in folders land below the target.
+    const QString tree =
+        MakeArchive(QStringLiteral("tree.zip"), {{"sub/", ""}, {"sub/x.dat", "x"}});
+    EXPECT_EQ(UnzipFile(tree, dir.filePath(QStringLiteral("t"))), kZipOk);
+    EXPECT_EQ(Read(dir.filePath(QStringLiteral("t/sub/x.dat"))), QByteArray("x"));
 }
 
-// Sets the uncompressed size of the archive's only entry in both headers.
+// Sets the uncompressed size of the archive's last entry in both headers.
 void ClaimSize(QByteArray& archive, quint32 size) {
-    const qsizetype local = archive.indexOf("PK\x03\x04");
-    const qsizetype central = archive.indexOf("PK\x01\x02");
+    const qsizetype local = archive.lastIndexOf("PK\x03\x04");
+    const qsizetype central = archive.lastIndexOf("PK\x01\x02");
     ASSERT_TRUE(local >= 0 && central > local);
     qToLittleEndian<quint32>(size, archive.data() + local + 22);
     qToLittleEndian<quint32>(size, archive.data() + central + 24);
@@ -231,11 +215,7 @@ TEST_F(ZipTest, EntryLongerThanItsHeaderSaysIsRefusedAtThatSize) {
 TEST_F(ZipTest, ArchiveLargerThanTheFreeSpaceIsRefusedBeforeAnythingIsWritten) {
     QByteArray bytes = Read(
         MakeArchive(QStringLiteral("huge.zip"), {{"a.dat", "a"}, {"huge.dat", LoggerText(10)}}));
-    // The second entry claims close to 4 GiB, in both headers; the first is honest.
-    const qsizetype local = bytes.indexOf("PK\x03\x04", 1);
-    const qsizetype central = bytes.lastIndexOf("PK\x01\x02");
-    qToLittleEndian<quint32>(0xFFFFFFF0u, bytes.data() + local + 22);
-    qToLittleEndian<quint32>(0xFFFFFFF0u, bytes.data() + central + 24);
+    ClaimSize(bytes, 0xFFFFFFF0u); // close to 4 GiB; the first entry is honest
     const QString archive = Write(QStringLiteral("huge.zip"), bytes);
 
     testing::FullDisk disk(8 << 20);

@@ -137,7 +137,7 @@ TEST_F(WebDataTest, ContinueIsWaitedThroughAndAnHttpErrorFailsTheCommand) {
     EXPECT_EQ(finished.size(), 1);
 }
 
-TEST_F(WebDataTest, NokNamesTheCommandAndTouchesNoFile) {
+TEST_F(WebDataTest, NokOrAnUnwritableFileFailsTheCommandAndTouchesNoFile) {
     const QString file = home.File(QStringLiteral("nok.dat"));
     server.Queue(HttpReply("NOK bad user\r\n"));
     EXPECT_FALSE(web.GetNewData(file, 1, 1));
@@ -150,6 +150,16 @@ TEST_F(WebDataTest, NokNamesTheCommandAndTouchesNoFile) {
     EXPECT_EQ(finished.last(), web.LastError());
     EXPECT_TRUE(LogBytes().contains("GETDATA>NOK file unknown"));
     EXPECT_FALSE(QFile::exists(file));
+
+    // A file that cannot be written is reported.
+    prompter.Script(kAnswerNo);
+    QueueNewData("OK 0", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
+    const QString unwritable = home.File(QStringLiteral("no/such/folder/x.dat"));
+    EXPECT_FALSE(web.GetNewData(unwritable, 1, 1));
+    ASSERT_EQ(prompter.shown.size(), 1u);
+    EXPECT_TRUE(prompter.shown[0].message.contains(QStringLiteral("TALUWebData:ProcessReply")));
+    EXPECT_EQ(programEnds, 0);
+    EXPECT_FALSE(QFile::exists(unwritable));
 }
 
 TEST_F(WebDataTest, UserFoldersNeedFiveItems) {
@@ -201,24 +211,6 @@ TEST_F(WebDataTest, TheOpenConnectionServesNewHostsAndTheSameUserButNotANewUser)
     EXPECT_EQ(server.connections, 2);
 }
 
-TEST_F(WebDataTest, AConnectionTheServerEndsIsOpenedAnewForTheNextCommand) {
-    const std::vector<Reply> endings = {
-        {Send(kFolders), CloseConnection()},
-        // Announced, but not yet done when the next command starts.
-        {Send(HttpReply("a|b|c|d|e\r\nOK\r\n", "Connection: close\r\n"))}};
-    for (const Reply& ending : endings) {
-        server.Queue(ending);
-        server.Queue(kFolders);
-        ASSERT_TRUE(web.Initialise());
-        const int opened = server.connections;
-        ASSERT_TRUE(PumpUntil([&] { return socket.State() != kSocketConnected; }));
-        statuses.clear();
-        EXPECT_TRUE(web.Initialise());
-        EXPECT_EQ(server.connections, opened + 1);
-        EXPECT_TRUE(statuses.contains(QStringLiteral("Connecting to ") + server.HostPort()));
-    }
-}
-
 TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     const QByteArray head = "HTTP/1.1 200 OK\r\nContent-Length: 999\r\n\r\n";
     QueueNewData("OK 0", {Send(head + kTwoRecords), Pause(int(kGap.count()) + 200),
@@ -240,33 +232,29 @@ TEST_F(WebDataTest, ACutOffReplyNeverWritesIntoItsFileAgain) {
     EXPECT_EQ(server.connections, 2);
 }
 
-TEST_F(WebDataTest, AnUnwritableFileIsReportedAndTheCommandFails) {
-    prompter.Script(kAnswerNo);
-    QueueNewData("OK 0", {Send(HttpReply(kTwoRecords + "OK\r\n"))});
-    const QString file = home.File(QStringLiteral("no/such/folder/x.dat"));
+TEST_F(WebDataTest, ASilentServerTimesOutARefusedConnectionFailsAndCancelEndsTheWait) {
+    server.Queue(kFolders);
+    ASSERT_TRUE(web.Initialise());
+    ASSERT_EQ(web.LastError(), QStringLiteral("OK"));
+    // Each failure has its own text, never the earlier command's.
+    QElapsedTimer timer;
+    timer.start();
+    EXPECT_FALSE(web.Initialise()); // no answer at all
+    EXPECT_GE(timer.elapsed(), kGap.count() - 20);
+    EXPECT_TRUE(web.LastError().contains(QStringLiteral("GETUSERFOLDERS")))
+        << web.LastError().toStdString();
+    EXPECT_EQ(server.requests.size(), 2);
+    EXPECT_EQ(finished.size(), 1);
+    EXPECT_EQ(busy.depth, 0);
 
-    EXPECT_FALSE(web.GetNewData(file, 1, 1));
-    ASSERT_EQ(prompter.shown.size(), 1u);
-    EXPECT_TRUE(prompter.shown[0].message.contains(QStringLiteral("TALUWebData:ProcessReply")));
-    EXPECT_EQ(programEnds, 0);
-    EXPECT_FALSE(QFile::exists(file));
-}
-
-TEST_F(WebDataTest, ARefusedConnectionFailsASilentServerTimesOutAndCancelEndsTheWait) {
     web.SetRemoteHost(ScriptServer().HostPort()); // nobody listens there any more
+    statuses.clear();
     EXPECT_FALSE(web.Initialise());
+    EXPECT_TRUE(web.LastError().startsWith(QStringLiteral("*Not* connected to ")));
     EXPECT_FALSE(statuses.filter(QStringLiteral("WinsockError: ")).isEmpty());
     EXPECT_TRUE(statuses.filter(QStringLiteral("Connected to ")).isEmpty());
 
     web.SetRemoteHost(server.HostPort());
-    QElapsedTimer timer;
-    timer.start();
-    EXPECT_FALSE(web.Initialise());
-    EXPECT_GE(timer.elapsed(), kGap.count() - 20);
-    EXPECT_EQ(server.requests.size(), 1);
-    EXPECT_TRUE(finished.isEmpty());
-    EXPECT_EQ(busy.depth, 0);
-
     clock.SetWaits(WaitLengths{.replyGap = std::chrono::seconds(20)});
     QObject::connect(&web, &CTALUWebData::ShowStatus, [&](const QString& text) {
         if (text.startsWith(QStringLiteral("Connected to ")))
@@ -275,7 +263,7 @@ TEST_F(WebDataTest, ARefusedConnectionFailsASilentServerTimesOutAndCancelEndsThe
     timer.restart();
     EXPECT_FALSE(web.Initialise());
     EXPECT_LT(timer.elapsed(), 10000);
-    EXPECT_EQ(server.requests.size(), 2);
+    EXPECT_EQ(server.requests.size(), 3);
 }
 
 TEST_F(WebDataTest, ProgressRunsFromTheLocalDateToTheServiceOrFromDateAndIsClamped) {

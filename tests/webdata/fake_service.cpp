@@ -49,7 +49,6 @@ Reply FakeService::Answer(const QByteArray& request) {
         return {Send(HttpReply("OK " + last + "\r\n"))};
     }
     if (cmd != QLatin1String("GETDATA")) return {Send(HttpReply("NOK unknown command\r\n"))};
-    ++getData;
     const QByteArray from =
         query.queryItemValue(QStringLiteral("date"), QUrl::FullyDecoded).toLatin1();
     // The records are in date order, as in a data file: the first one after
@@ -63,7 +62,7 @@ Reply FakeService::Answer(const QByteArray& request) {
                   return Seconds(RecordDate(r)) <= after;
               });
     QByteArray body = Joined(QList<QByteArray>(first, records.cend())) + "OK\r\n";
-    const QByteArray reply = chunked ? ChunkedReply(body, {4000, 3000, 7}) : HttpReply(body);
+    const QByteArray reply = HttpReply(body);
     QList<qsizetype> cuts;
     for (int i = 1; i < pieces; ++i)
         cuts << reply.size() * i / pieces;

@@ -17,10 +17,8 @@ QByteArray Joined(const QList<QByteArray>& records);
 
 struct FakeService {
     QList<QByteArray> records; // in date order
-    bool chunked = false;
-    int pieces = 1;  // the GETDATA reply is sent in this many pieces ...
-    int pauseMs = 0; // ... with this pause between them
-    int getData = 0; // GETDATA requests answered
+    int pieces = 1;            // the GETDATA reply is sent in this many pieces ...
+    int pauseMs = 0;           // ... with this pause between them
 
     QByteArray File() const { return Joined(records); }
     Reply Answer(const QByteArray& request);

@@ -96,7 +96,7 @@ TEST_F(Layouts, OnlyAnHour24TimeIsAWholeDayAndUnreadableTextsAreLogged) {
     EXPECT_TRUE(LogBytes().contains(":Date error:someday"));
 }
 
-TEST_F(Layouts, AFileWithNothingToReadGivesADash) {
+TEST_F(Layouts, AFileWithNothingToReadOrABadLastLineGivesADash) {
     EXPECT_EQ(LastDate("2006-01-01 00:00:00,1\r2006-05-01 10:20:30,2\r", kDateTime),
               QStringLiteral("1 May 2006 10:20:30"));
     EXPECT_EQ(LastDate("", kDateTime), QStringLiteral("-"));
@@ -107,9 +107,8 @@ TEST_F(Layouts, AFileWithNothingToReadGivesADash) {
     EXPECT_EQ(web.LastDateInFile(data, 0, 0, kDateTime, 0), QStringLiteral("-"));
     EXPECT_EQ(web.LastDateInFile(data, 0, 7, kDateTime, 1), QString());
     EXPECT_EQ(busy.depth, 0);
-}
 
-TEST_F(Layouts, ABadLastLineIsReportedAndGivesNoDate) {
+    // A bad last line is reported as well.
     prompter.Script(kAnswerNo);
     EXPECT_EQ(LastDate("2006,5,1,10\r\n", kYmdhm), QStringLiteral("-"));
     ASSERT_EQ(prompter.shown.size(), 1u);
