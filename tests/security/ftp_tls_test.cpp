@@ -23,13 +23,13 @@ protected:
         QString error;
         ASSERT_TRUE(MakeTestCertificates(certs.path(), error)) << error.toStdString();
         QDir().mkpath(Root());
-        Write(Root() + QStringLiteral("/site1.dat"), "2006-05-01 10:00:00,1\r\n");
-        TlsTrust::SetExtraCaFiles({certs.filePath(QStringLiteral("ca.pem"))});
+        Write(Root() + "/site1.dat", "2006-05-01 10:00:00,1\r\n");
+        TlsTrust::SetExtraCaFiles({certs.filePath("ca.pem")});
         session.SetDisplay(&trace, nullptr);
     }
     void TearDown() override { TlsTrust::SetExtraCaFiles({}); }
 
-    QString Root() const { return files.filePath(QStringLiteral("root")); }
+    QString Root() const { return files.filePath("root"); }
     static void Write(const QString& path, const QByteArray& bytes) {
         QFile file(path);
         ASSERT_TRUE(file.open(QIODevice::WriteOnly));
@@ -113,17 +113,15 @@ TEST_F(FtpTlsTest, CertificateAndProtocolFailuresAreRefusedBeforeTheLogIn) {
         TlsTrust::SetExtraCaFiles(c.trustTestCa ? QStringList{certs.filePath("ca.pem")}
                                                 : QStringList{});
         session.SetDetails(address, "logger", "secret", true);
-        EXPECT_FALSE(session.Download(QStringLiteral("site1.dat"), home.File(QStringLiteral("x"))));
+        EXPECT_FALSE(session.Download("site1.dat", home.File("x")));
         const QString error = session.LastError();
-        EXPECT_TRUE(error.startsWith(QStringLiteral("Failed ftp access to ") + address))
-            << error.toStdString();
+        EXPECT_TRUE(error.startsWith("Failed ftp access to " + address)) << error.toStdString();
         EXPECT_TRUE(error.contains(QString::fromUtf8(c.reason))) << error.toStdString();
-        EXPECT_FALSE(server.Log().contains(QStringLiteral("CMD USER")))
-            << server.Log().toStdString();
-        EXPECT_FALSE(server.Log().contains(QStringLiteral("CMD PASS")));
+        EXPECT_FALSE(server.Log().contains("CMD USER")) << server.Log().toStdString();
+        EXPECT_FALSE(server.Log().contains("CMD PASS"));
         session.Close();
     }
-    EXPECT_FALSE(QFile::exists(home.File(QStringLiteral("x"))));
+    EXPECT_FALSE(QFile::exists(home.File("x")));
 }
 
 } // namespace

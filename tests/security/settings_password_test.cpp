@@ -41,30 +41,29 @@ TEST(SettingsPassword, GoesToTheStoreWhenThereIsOneAndStaysInTheFileOtherwise) {
     PasswordKeeper::ResetLogMemory();
     LocalSettings settings(ProgramHome::SettingsFile());
     AppSettings values = AppSettings::Defaults(home.Path(), 2024);
-    values.userId = QStringLiteral("ann");
-    values.password = QStringLiteral("p&ss word");
+    values.userId = "ann";
+    values.password = "p&ss word";
 
     // Without a store, as described: the owner-only file holds it.
     ASSERT_TRUE(values.Save(settings));
-    EXPECT_TRUE(FileText(settings.Path()).contains(QStringLiteral("Password=p&ss word")));
+    EXPECT_TRUE(FileText(settings.Path()).contains("Password=p&ss word"));
 
     MapStore store;
     SetProcessSecretStore(&store);
     AppSettings loaded;
     ASSERT_FALSE(loaded.Load(settings, home.Path(), 2024));
-    EXPECT_EQ(loaded.password, QStringLiteral("p&ss word"));
+    EXPECT_EQ(loaded.password, "p&ss word");
     // Read once with a store there, the password left the file.
-    EXPECT_EQ(store.entries.value(settings.Path() + QStringLiteral("|Password")),
-              QStringLiteral("p&ss word"));
-    EXPECT_FALSE(FileText(settings.Path()).contains(QStringLiteral("p&ss")));
+    EXPECT_EQ(store.entries.value(settings.Path() + "|Password"), "p&ss word");
+    EXPECT_FALSE(FileText(settings.Path()).contains("p&ss"));
 
-    loaded.password = QStringLiteral("changed");
+    loaded.password = "changed";
     ASSERT_TRUE(loaded.Save(settings));
-    EXPECT_TRUE(FileText(settings.Path()).contains(QStringLiteral("Password=Null")));
-    EXPECT_FALSE(FileText(settings.Path()).contains(QStringLiteral("changed")));
+    EXPECT_TRUE(FileText(settings.Path()).contains("Password=Null"));
+    EXPECT_FALSE(FileText(settings.Path()).contains("changed"));
     AppSettings again;
     ASSERT_FALSE(again.Load(settings, home.Path(), 2024));
-    EXPECT_EQ(again.password, QStringLiteral("changed"));
+    EXPECT_EQ(again.password, "changed");
     SetProcessSecretStore(nullptr);
 }
 

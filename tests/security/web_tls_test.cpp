@@ -13,40 +13,39 @@ QString Port(const TlsWebPeer& web, TlsSite site) {
 TEST_F(TlsServiceTest, AnHttpsServerTextRunsTheWholeExchangeOverVerifiedTls) {
     object.SetRemoteHost(web.Address(TlsSite::Good));
     ASSERT_TRUE(object.Initialise()) << object.LastError().toStdString();
-    EXPECT_EQ(object.UserName(), QStringLiteral("Ann Example"));
+    EXPECT_EQ(object.UserName(), "Ann Example");
     service.PlaceFile(
-        QStringLiteral("ann"), QStringLiteral("site1.dat"),
+        "ann", "site1.dat",
         "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n2006-05-01 10:20:00,3\r\n");
-    const QString local = home.Write(QStringLiteral("site1.dat"), "2006-05-01 10:00:00,1\r\n");
+    const QString local = home.Write("site1.dat", "2006-05-01 10:00:00,1\r\n");
     ASSERT_TRUE(object.GetNewData(local, 1, 1)) << object.LastError().toStdString();
-    EXPECT_EQ(home.Read(QStringLiteral("site1.dat")),
+    EXPECT_EQ(home.Read("site1.dat"),
               "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n2006-05-01 10:20:00,3\r\n");
 
     // Request line and Host header carry the host and port of the text; the
     // three commands went over one connection.
-    const QString hostPort = QStringLiteral("localhost:") + Port(web, TlsSite::Good);
-    EXPECT_TRUE(traces.contains(QStringLiteral("S>GET https://") + hostPort +
+    const QString hostPort = "localhost:" + Port(web, TlsSite::Good);
+    EXPECT_TRUE(traces.contains("S>GET https://" + hostPort +
                                 QStringLiteral("/wd/wd.php?cmd=GETUSERFOLDERS&user=ann&pwd=***&"
                                                "dt=0&filelocation=0 HTTP/1.1")))
-        << traces.join(QLatin1Char('\n')).toStdString();
-    EXPECT_TRUE(traces.contains(QStringLiteral("S>Host: ") + hostPort));
-    EXPECT_EQ(statuses.count(QStringLiteral("Connecting to ") + web.Address(TlsSite::Good)), 1);
-    EXPECT_EQ(AccessCount(QStringLiteral("/wd/wd.php?cmd="), 3), 3) << AccessLog().toStdString();
+        << traces.join('\n').toStdString();
+    EXPECT_TRUE(traces.contains("S>Host: " + hostPort));
+    EXPECT_EQ(statuses.count("Connecting to " + web.Address(TlsSite::Good)), 1);
+    EXPECT_EQ(AccessCount("/wd/wd.php?cmd=", 3), 3) << AccessLog().toStdString();
     EXPECT_EQ(programEnds, 0);
     EXPECT_TRUE(prompter.shown.empty());
 }
 
 TEST_F(TlsServiceTest, TheCertificateMatchesByAddressAndThePortDefaultsTo443) {
     // 127.0.0.1 is in the certificate as an address.
-    object.SetRemoteHost(web.Address(TlsSite::Good, QStringLiteral("127.0.0.1")));
+    object.SetRemoteHost(web.Address(TlsSite::Good, "127.0.0.1"));
     EXPECT_TRUE(object.Initialise()) << object.LastError().toStdString();
     // Without a port the exchange goes to 443, where nobody listens here.
     ShortGap();
     object.Disconnect();
-    object.SetRemoteHost(QStringLiteral("HTTPS://127.0.0.1/"));
+    object.SetRemoteHost("HTTPS://127.0.0.1/");
     EXPECT_FALSE(object.Initialise());
-    EXPECT_TRUE(object.LastError().contains(QStringLiteral("refused")))
-        << object.LastError().toStdString();
+    EXPECT_TRUE(object.LastError().contains("refused")) << object.LastError().toStdString();
 }
 
 TEST_F(TlsServiceTest, AnUntrustedOrPlainServerIsRefusedWithItsReasonAndNothingIsSent) {
@@ -97,13 +96,11 @@ TEST_F(TlsServiceTest, APlainConnectionIsNeverReusedForAnHttpsAddressNorTheOther
     ASSERT_TRUE(object.Initialise()) << object.LastError().toStdString();
     object.SetRemoteHost(web.HostPort(TlsSite::Plain));
     ASSERT_TRUE(object.Initialise()) << object.LastError().toStdString();
-    AccessCount(QStringLiteral("wd.php"), 3);
+    AccessCount("wd.php", 3);
     const QString access = AccessLog();
-    EXPECT_EQ(access.count(Port(web, TlsSite::Plain) + QStringLiteral(" GET http://")), 2)
-        << access.toStdString();
-    EXPECT_EQ(access.count(Port(web, TlsSite::Good) + QStringLiteral(" GET https://")), 1)
-        << access.toStdString();
-    EXPECT_EQ(statuses.filter(QStringLiteral("Connecting to ")).size(), 3);
+    EXPECT_EQ(access.count(Port(web, TlsSite::Plain) + " GET http://"), 2) << access.toStdString();
+    EXPECT_EQ(access.count(Port(web, TlsSite::Good) + " GET https://"), 1) << access.toStdString();
+    EXPECT_EQ(statuses.filter("Connecting to ").size(), 3);
 }
 
 // Both fail before a byte is sent, with the whole reason.
