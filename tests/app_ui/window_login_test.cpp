@@ -36,12 +36,6 @@ protected:
         ftpClose();
         if (HasFailure()) std::cerr << "Service log:\n" << service.Log().toStdString();
     }
-    QStringList Boxes() const {
-        QStringList shown;
-        for (const auto& box : ports.prompter.shown)
-            shown << box.message;
-        return shown;
-    }
     void Login() {
         ports.prompter.shown.clear();
         window->Flags().InMessage = false;
