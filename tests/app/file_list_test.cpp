@@ -180,49 +180,37 @@ TEST(LocalDates, TheLastLineForAnIdentifierWins) {
     EXPECT_TRUE(list.At(1).FileDateLocal.isEmpty());
 }
 
-struct FullDiskSave {
-    const char* name;
-    int oldRecords;
-    int newRecords;
-    qint64 room;
-};
-// Test names show the case name, not the bytes of the case.
-void PrintTo(const FullDiskSave& c, std::ostream* os) {
-    *os << c.name;
+TEST(FileListSave, OnAFullDiskFailsSaysWhyAndKeepsTheOldList) {
+    struct Case {
+        int oldRecords, newRecords;
+        qint64 room;
+    };
+    for (const Case& c : {Case{2, 3, 0}, Case{40, 483, 8192}}) { // no room, room for a part
+        SCOPED_TRACE(c.room);
+        FullDisk disk;
+        const QString path = disk.File("files.txt");
+        ASSERT_FALSE(testing::WriteSampleList(path, c.oldRecords).has_value());
+        const QByteArray before = disk.Read("files.txt");
+        disk.Fill(c.room);
+
+        FileList list = testing::SampleList(c.newRecords);
+        list.LoadedFile = path;
+        list.ListChanged = true;
+        const LocationFolders folders{disk.Path(), disk.Path(), {}, {}, {}, {}};
+        const auto outcome = disk.Run([&] {
+            const auto error = list.SaveFileList(folders);
+            return FullDisk::Outcome{!error, error ? error->description + "|" + error->where : ""};
+        });
+        EXPECT_FALSE(outcome.ok);
+        EXPECT_EQ(outcome.text,
+                  "Could not write " + path + ": " + disk.Reason() + "|SaveFileList:" + path);
+        EXPECT_EQ(disk.Read("files.txt"), before);
+        EXPECT_EQ(disk.Files(), QStringList{"files.txt"});
+        FileList again;
+        ASSERT_TRUE(again.LoadDataFile(path).ok);
+        EXPECT_EQ(again.Count(), c.oldRecords);
+    }
 }
-
-class FileListSaveOnFullDisk : public ::testing::TestWithParam<FullDiskSave> {};
-
-TEST_P(FileListSaveOnFullDisk, FailsSaysWhyAndKeepsTheOldList) {
-    const FullDiskSave& c = GetParam();
-    FullDisk disk;
-    const QString path = disk.File("files.txt");
-    ASSERT_FALSE(testing::WriteSampleList(path, c.oldRecords).has_value());
-    const QByteArray before = disk.Read("files.txt");
-    disk.Fill(c.room);
-
-    FileList list = testing::SampleList(c.newRecords);
-    list.LoadedFile = path;
-    list.ListChanged = true;
-    const LocationFolders folders{disk.Path(), disk.Path(), {}, {}, {}, {}};
-    const auto outcome = disk.Run([&] {
-        const auto error = list.SaveFileList(folders);
-        return FullDisk::Outcome{!error, error ? error->description + "|" + error->where : ""};
-    });
-    EXPECT_FALSE(outcome.ok);
-    EXPECT_EQ(outcome.text,
-              "Could not write " + path + ": " + disk.Reason() + "|SaveFileList:" + path);
-    EXPECT_EQ(disk.Read("files.txt"), before);
-    EXPECT_EQ(disk.Files(), QStringList{"files.txt"});
-    FileList again;
-    ASSERT_TRUE(again.LoadDataFile(path).ok);
-    EXPECT_EQ(again.Count(), c.oldRecords);
-}
-
-INSTANTIATE_TEST_SUITE_P(Cases, FileListSaveOnFullDisk,
-                         ::testing::Values(FullDiskSave{"SmallListNoRoom", 2, 3, 0},
-                                           FullDiskSave{"LargerListPartialRoom", 40, 483, 8192}),
-                         [](const auto& info) { return std::string(info.param.name); });
 
 TEST(FileListText, EachLineKeepsItsOwnEncodingBothWays) {
     TempHome home;
