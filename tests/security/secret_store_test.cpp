@@ -2,6 +2,7 @@
 // private D-Bus session, see with_keyring.sh), the fallback to the owner-only
 // settings file without one, and the keeping rules between the two.
 #include "common/temp_home.h"
+#include "fake_secret_store.h"
 #include "support/ini_store.h"
 #include "support/password_keeper.h"
 #include "support/program_home.h"
@@ -9,7 +10,6 @@
 
 #include <QElapsedTimer>
 #include <QFile>
-#include <QMap>
 
 #include <gtest/gtest.h>
 
@@ -29,26 +29,6 @@ QString Read(const QString& path) {
 }
 
 // ---- the keeping rules, over a store the test controls ----
-
-class FakeStore : public SecretStore {
-public:
-    Result Read(const QString& key) override {
-        if (!answers) return {Status::Unavailable, {}, "no bus"};
-        if (!entries.contains(key)) return {Status::NotFound, {}, {}};
-        return {Status::Ok, entries.value(key), {}};
-    }
-    Result Write(const QString& key, const QString& secret) override {
-        if (!answers) return {Status::Unavailable, {}, "no bus"};
-        entries[key] = secret;
-        return {Status::Ok, {}, {}};
-    }
-    Result Remove(const QString& key) override {
-        if (!answers) return {Status::Unavailable, {}, "no bus"};
-        return {entries.remove(key) ? Status::Ok : Status::NotFound, {}, {}};
-    }
-    bool answers = true;
-    QMap<QString, QString> entries;
-};
 
 class KeeperTest : public ::testing::Test {
 protected:

@@ -2,34 +2,18 @@
 // store when there is one, and in the settings file otherwise.
 #include "app/app_settings.h"
 #include "common/temp_home.h"
+#include "fake_secret_store.h"
 #include "support/ini_store.h"
 #include "support/password_keeper.h"
 #include "support/program_home.h"
 #include "support/secret_store.h"
 
 #include <QFile>
-#include <QMap>
 
 #include <gtest/gtest.h>
 
 namespace quorvel::testing {
 namespace {
-
-class MapStore : public SecretStore {
-public:
-    Result Read(const QString& key) override {
-        if (!entries.contains(key)) return {Status::NotFound, {}, {}};
-        return {Status::Ok, entries.value(key), {}};
-    }
-    Result Write(const QString& key, const QString& secret) override {
-        entries[key] = secret;
-        return {Status::Ok, {}, {}};
-    }
-    Result Remove(const QString& key) override {
-        return {entries.remove(key) ? Status::Ok : Status::NotFound, {}, {}};
-    }
-    QMap<QString, QString> entries;
-};
 
 QString FileText(const QString& path) {
     QFile file(path);
@@ -48,7 +32,7 @@ TEST(SettingsPassword, GoesToTheStoreWhenThereIsOneAndStaysInTheFileOtherwise) {
     ASSERT_TRUE(values.Save(settings));
     EXPECT_TRUE(FileText(settings.Path()).contains("Password=p&ss word"));
 
-    MapStore store;
+    FakeStore store;
     SetProcessSecretStore(&store);
     AppSettings loaded;
     ASSERT_FALSE(loaded.Load(settings, home.Path(), 2024));
