@@ -63,6 +63,18 @@ TEST(FileListLoad, MissingFileIsEmptyAFolderFailsAndAnOverflowIsReported) {
     ASSERT_EQ(list.Count(), 3);
     EXPECT_EQ(list.At(1), FileRecord{});
     EXPECT_EQ(list.At(2).FileID, 3);
+
+    // Several make one report that names the first.
+    const QString path = home.Write(
+        "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + bad + "\r\n 3 ~1~c~c.csv~0~99999\r\n").toUtf8());
+    const ListLoadResult several = list.LoadDataFile(path);
+    EXPECT_EQ(list.Count(), 3);
+    ASSERT_EQ(several.errors.size(), 1u);
+    EXPECT_EQ(several.errors[0],
+              (AppError{"Overflow in 2 records: a number above 32767 or below -32768 (the first: "
+                        "LoadFilesRecord: " +
+                            bad + ")",
+                        "LoadDataFile:" + path}));
 }
 
 TEST(FileListSave, SaveAndReloadGiveEveryFieldButTheLocalDate) {
@@ -168,49 +180,37 @@ TEST(LocalDates, TheLastLineForAnIdentifierWins) {
     EXPECT_TRUE(list.At(1).FileDateLocal.isEmpty());
 }
 
-struct FullDiskSave {
-    const char* name;
-    int oldRecords;
-    int newRecords;
-    qint64 room;
-};
-// Test names show the case name, not the bytes of the case.
-void PrintTo(const FullDiskSave& c, std::ostream* os) {
-    *os << c.name;
+TEST(FileListSave, OnAFullDiskFailsSaysWhyAndKeepsTheOldList) {
+    struct Case {
+        int oldRecords, newRecords;
+        qint64 room;
+    };
+    for (const Case& c : {Case{2, 3, 0}, Case{40, 483, 8192}}) { // no room, room for a part
+        SCOPED_TRACE(c.room);
+        FullDisk disk;
+        const QString path = disk.File("files.txt");
+        ASSERT_FALSE(testing::WriteSampleList(path, c.oldRecords).has_value());
+        const QByteArray before = disk.Read("files.txt");
+        disk.Fill(c.room);
+
+        FileList list = testing::SampleList(c.newRecords);
+        list.LoadedFile = path;
+        list.ListChanged = true;
+        const LocationFolders folders{disk.Path(), disk.Path(), {}, {}, {}, {}};
+        const auto outcome = disk.Run([&] {
+            const auto error = list.SaveFileList(folders);
+            return FullDisk::Outcome{!error, error ? error->description + "|" + error->where : ""};
+        });
+        EXPECT_FALSE(outcome.ok);
+        EXPECT_EQ(outcome.text,
+                  "Could not write " + path + ": " + disk.Reason() + "|SaveFileList:" + path);
+        EXPECT_EQ(disk.Read("files.txt"), before);
+        EXPECT_EQ(disk.Files(), QStringList{"files.txt"});
+        FileList again;
+        ASSERT_TRUE(again.LoadDataFile(path).ok);
+        EXPECT_EQ(again.Count(), c.oldRecords);
+    }
 }
-
-class FileListSaveOnFullDisk : public ::testing::TestWithParam<FullDiskSave> {};
-
-TEST_P(FileListSaveOnFullDisk, FailsSaysWhyAndKeepsTheOldList) {
-    const FullDiskSave& c = GetParam();
-    FullDisk disk;
-    const QString path = disk.File("files.txt");
-    ASSERT_FALSE(testing::WriteSampleList(path, c.oldRecords).has_value());
-    const QByteArray before = disk.Read("files.txt");
-    disk.Fill(c.room);
-
-    FileList list = testing::SampleList(c.newRecords);
-    list.LoadedFile = path;
-    list.ListChanged = true;
-    const LocationFolders folders{disk.Path(), disk.Path(), {}, {}, {}, {}};
-    const auto outcome = disk.Run([&] {
-        const auto error = list.SaveFileList(folders);
-        return FullDisk::Outcome{!error, error ? error->description + "|" + error->where : ""};
-    });
-    EXPECT_FALSE(outcome.ok);
-    EXPECT_EQ(outcome.text,
-              "Could not write " + path + ": " + disk.Reason() + "|SaveFileList:" + path);
-    EXPECT_EQ(disk.Read("files.txt"), before);
-    EXPECT_EQ(disk.Files(), QStringList{"files.txt"});
-    FileList again;
-    ASSERT_TRUE(again.LoadDataFile(path).ok);
-    EXPECT_EQ(again.Count(), c.oldRecords);
-}
-
-INSTANTIATE_TEST_SUITE_P(Cases, FileListSaveOnFullDisk,
-                         ::testing::Values(FullDiskSave{"SmallListNoRoom", 2, 3, 0},
-                                           FullDiskSave{"LargerListPartialRoom", 40, 483, 8192}),
-                         [](const auto& info) { return std::string(info.param.name); });
 
 TEST(FileListText, EachLineKeepsItsOwnEncodingBothWays) {
     TempHome home;
@@ -272,22 +272,6 @@ TEST(FileListLoad, RecordsBeyondTheLimitAreReportedOnceWithTheirNumber) {
     EXPECT_EQ(result.errors[0].description,
               "7234 records were not loaded: a file list holds at most 32767 records");
     EXPECT_EQ(result.errors[0].where, "LoadDataFile:" + path);
-}
-
-TEST(FileListLoad, SeveralOverflowsMakeOneReportThatNamesTheFirst) {
-    TempHome home;
-    const QString first = "40000~1~Big~big.csv~0~0~0~0~0~1~0~~~0";
-    const QString path = home.Write(
-        "files.txt", (" 1 ~1~a~a.csv~0~0\r\n" + first + "\r\n 3 ~1~c~c.csv~0~99999\r\n").toUtf8());
-    FileList list;
-    const ListLoadResult result = list.LoadDataFile(path);
-    EXPECT_EQ(list.Count(), 3);
-    ASSERT_EQ(result.errors.size(), 1u);
-    EXPECT_EQ(result.errors[0],
-              (AppError{"Overflow in 2 records: a number above 32767 or below -32768 (the first: "
-                        "LoadFilesRecord: " +
-                            first + ")",
-                        "LoadDataFile:" + path}));
 }
 
 } // namespace

@@ -29,18 +29,6 @@ protected:
     }
 };
 
-// The values themselves are the settings' own; here the window shows them.
-TEST_F(SettingsTest, FirstStartWithoutSettingsUsesTheDefaults) {
-    Start();
-    EXPECT_EQ(C().Txt_LocalFolder[0]->text(), home.Path());
-    EXPECT_EQ(C().Opt_GetFileList->CheckedIndex(), 1);
-    EXPECT_EQ(C().Cmb_interval->currentText(), "3 hrs");
-    EXPECT_EQ(C().Cmb_interval->count(), 6);
-    EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("files.txt"));
-    EXPECT_EQ(window->windowTitle(), "TALU Quorvel");
-    EXPECT_FALSE(window->StartedMinimised());
-}
-
 // A first start is no dead end: the empty list says what to do next, and
 // what it says follows who keeps the list.
 TEST_F(SettingsTest, AFirstStartSaysWhatToDoNext) {
@@ -56,6 +44,14 @@ TEST_F(SettingsTest, AFirstStartSaysWhatToDoNext) {
                 count += QColor(image.pixel(x, y)) != back ? 1 : 0;
         return count;
     };
+    // The defaults themselves are the settings' own; here the window shows them.
+    EXPECT_EQ(C().Txt_LocalFolder[0]->text(), home.Path());
+    EXPECT_EQ(C().Opt_GetFileList->CheckedIndex(), 1);
+    EXPECT_EQ(C().Cmb_interval->currentText(), "3 hrs");
+    EXPECT_EQ(C().Cmb_interval->count(), 6);
+    EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("files.txt"));
+    EXPECT_EQ(window->windowTitle(), "TALU Quorvel");
+    EXPECT_FALSE(window->StartedMinimised());
     // Nothing to sign in with yet: no fetch from an empty address, but the way there.
     EXPECT_TRUE(C().Lbl_status->text().startsWith("Welcome to Quorvel: enter the CFG file"))
         << C().Lbl_status->text().toStdString();
@@ -69,17 +65,6 @@ TEST_F(SettingsTest, AFirstStartSaysWhatToDoNext) {
     C().Cmd_DoFile[kFileNew]->click();
     EXPECT_EQ(ListNames(), QStringList({"first.csv"}));
     EXPECT_EQ(hintPixels(), 0);
-}
-
-TEST_F(SettingsTest, FirstActivationLoadsTheListOfTheFirstRecentEntry) {
-    UserMaintainsList();
-    WriteList({Line("A", "a.csv")}, "lists/season.txt");
-    Setting("File1", home.File("lists/season.txt"));
-    Start();
-    EXPECT_EQ(ListNames(), QStringList({"A"}));
-    EXPECT_EQ(C().Lst_Files->currentRow(), 0);
-    EXPECT_EQ(C().Txt_Name->text(), "A");
-    EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("lists/season.txt"));
 }
 
 TEST_F(SettingsTest, FieldsSurviveARestart) {
@@ -188,7 +173,8 @@ TEST_F(SettingsTest, TheAutostartEntryCarriesAHomeThatIsNotTheDefault) {
     ProgramHome::SetFolder(home.Path());
 }
 
-// The recent lists are written at exit with the other settings.
+// The recent lists are written at exit with the other settings, and the
+// start opens the newest of them.
 TEST_F(SettingsTest, TheRecentListsSurviveARestart) {
     UserMaintainsList();
     WriteList({Line("A", "a.csv")});
@@ -207,8 +193,11 @@ TEST_F(SettingsTest, TheRecentListsSurviveARestart) {
     for (int i = 1; i <= 5 && !window->Recent().Entry(i).isEmpty(); ++i)
         recent << window->Recent().Entry(i);
     EXPECT_EQ(recent, shown);
-    // The newest is the list the start opens.
+    // The first activation opens the newest and shows its first record.
     EXPECT_EQ(ListNames(), QStringList({"C"}));
+    EXPECT_EQ(C().Lst_Files->currentRow(), 0);
+    EXPECT_EQ(C().Txt_Name->text(), "C");
+    EXPECT_EQ(C().Lbl_LoadedFile->text(), home.File("lists/c.txt"));
 }
 
 TEST_F(SettingsTest, AListOnlyLoadedIsNotWrittenBackAtExit) {

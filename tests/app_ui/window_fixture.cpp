@@ -6,6 +6,7 @@
 #include <QApplication>
 #include <QDir>
 #include <QMessageBox>
+#include <QTcpServer>
 
 namespace quorvel::testing {
 
@@ -18,6 +19,19 @@ WindowTest::~WindowTest() {
     if (window) window->close();
     window.reset();
     qunsetenv("XDG_CONFIG_HOME");
+}
+
+QStringList WindowTest::Boxes() const {
+    QStringList shown;
+    for (const auto& box : ports.prompter.shown)
+        shown << box.message;
+    return shown;
+}
+
+QString WindowTest::DeadServer() {
+    QTcpServer probe;
+    probe.listen(QHostAddress::LocalHost);
+    return QStringLiteral("127.0.0.1:%1").arg(probe.serverPort());
 }
 
 void WindowTest::Setting(const QString& key, const QString& value) {

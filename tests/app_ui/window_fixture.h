@@ -55,6 +55,10 @@ protected:
     void Select(int row);
     QStringList ListNames() const;
     static void ExpectEnabled(std::initializer_list<QWidget*> widgets, bool enabled);
+    // The messages of the boxes shown so far.
+    QStringList Boxes() const;
+    // A server text for a loopback port that nobody listens on.
+    static QString DeadServer();
     // Answers the next file dialogs with these paths (empty: cancelled).
     void AnswerDialogs(const QStringList& files);
     // Answers the next unsaved-changes questions (QMessageBox::Save, Discard,

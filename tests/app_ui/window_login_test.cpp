@@ -6,26 +6,14 @@
 #include "common/reference_service.h"
 #include "transfer/ftp.h"
 
+#include <QMessageBox>
+
 #include <iostream>
-#include <ostream>
 
 namespace quorvel::testing {
 namespace {
 
 const QByteArray kList = " 1 ~1~Site 1~site1.dat~1~2~1~1~0~1~0~~~0\r\n";
-
-struct LoginCase {
-    const char* name;
-    bool cfgThere;
-    const char* password;
-    bool administrator; // "Folders from..." = "Administrator"
-    const char* box;    // the message shown; "%1" stands for the CFG address
-    bool gotSecure, gotPHP, gotFileList;
-};
-// The case's name in test listings.
-void PrintTo(const LoginCase& c, std::ostream* out) {
-    *out << c.name;
-}
 
 class WindowLoginTest : public WindowTest {
 protected:
@@ -35,6 +23,10 @@ protected:
             << service.LastError().toStdString();
         service.PlaceFile("ann", "files.txt", kList);
         ASSERT_TRUE(service.Start()) << service.LastError().toStdString();
+        WriteAccount();
+    }
+    // The account as the settings hold it before a start.
+    void WriteAccount() {
         Setting("CFG_URL", service.CfgUrl("ann"));
         Setting("UserID", "ann");
         Setting("Password", "p&ss word");
@@ -43,12 +35,6 @@ protected:
     void TearDown() override {
         ftpClose();
         if (HasFailure()) std::cerr << "Service log:\n" << service.Log().toStdString();
-    }
-    QStringList Boxes() const {
-        QStringList shown;
-        for (const auto& box : ports.prompter.shown)
-            shown << box.message;
-        return shown;
     }
     void Login() {
         ports.prompter.shown.clear();
@@ -59,41 +45,45 @@ protected:
     ReferenceService service;
 };
 
-class LoginMessagesTest : public WindowLoginTest,
-                          public ::testing::WithParamInterface<LoginCase> {};
-
-TEST_P(LoginMessagesTest, OneMessageAndTheBoxesOfTheStepsThatSucceeded) {
-    const LoginCase& c = GetParam();
-    Start();
-    const QString cfg = c.cfgThere ? service.CfgUrl("ann") : service.CfgUrl("nobody");
-    C().Txt_CFG_URL->setText(cfg);
-    C().Txt_Password->setText(c.password);
-    C().Opt_GetLocalFolders->SetIndex(c.administrator ? 1 : 0);
-    Login();
-    EXPECT_EQ(Boxes(), QStringList{QString::fromUtf8(c.box).replace("%1", cfg)});
-    EXPECT_EQ(C().Chk_GotSecure->isChecked(), c.gotSecure);
-    EXPECT_EQ(C().Chk_GotPHP->isChecked(), c.gotPHP);
-    EXPECT_EQ(C().Chk_GotFileList->isChecked(), c.gotFileList);
-    if (c.gotSecure) {
-        EXPECT_EQ(C().Txt_ftpPassword->text(), service.FtpPassword("ann"));
-    }
-    // A refused user leaves no name of the login at start-up behind.
-    if (c.gotSecure && !c.gotPHP) {
-        EXPECT_TRUE(C().Lbl_UserName->text().isEmpty());
+TEST_F(WindowLoginTest, OneMessageAndTheBoxesOfTheStepsThatSucceeded) {
+    struct Case {
+        bool cfgThere;
+        const char* password;
+        bool administrator; // "Folders from..." = "Administrator"
+        const char* box;    // the message shown; "%1" stands for the CFG address
+        bool gotSecure, gotPHP, gotFileList;
+    };
+    const char* welcome = "Ann Example - welcome to Quorvel";
+    const Case cases[] = {
+        {true, "p&ss word", true, welcome, true, true, true},
+        {true, "p&ss word", false, welcome, true, true, false}, // folders from the user: no list
+        {false, "p&ss word", true, "Could not get details from: %1", false, false, false},
+        {true, "wrong", true, "Login failed", true, false, false},
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.box + std::string(c.administrator ? "" : " (user's folders)"));
+        WriteAccount();
+        Start();
+        const QString cfg = c.cfgThere ? service.CfgUrl("ann") : service.CfgUrl("nobody");
+        C().Txt_CFG_URL->setText(cfg);
+        C().Txt_Password->setText(c.password);
+        C().Opt_GetLocalFolders->SetIndex(c.administrator ? 1 : 0);
+        Login();
+        EXPECT_EQ(Boxes(), QStringList{QString::fromUtf8(c.box).replace("%1", cfg)});
+        EXPECT_EQ(C().Chk_GotSecure->isChecked(), c.gotSecure);
+        EXPECT_EQ(C().Chk_GotPHP->isChecked(), c.gotPHP);
+        EXPECT_EQ(C().Chk_GotFileList->isChecked(), c.gotFileList);
+        if (c.gotSecure) {
+            EXPECT_EQ(C().Txt_ftpPassword->text(), service.FtpPassword("ann"));
+        }
+        // A refused user leaves no name of the login at start-up behind.
+        if (c.gotSecure && !c.gotPHP) {
+            EXPECT_TRUE(C().Lbl_UserName->text().isEmpty());
+        }
+        AnswerUnsaved({QMessageBox::Discard});
+        Close();
     }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Messages, LoginMessagesTest,
-    ::testing::Values(LoginCase{"Welcome", true, "p&ss word", true,
-                                "Ann Example - welcome to Quorvel", true, true, true},
-                      LoginCase{"FoldersFromTheUserFetchNoList", true, "p&ss word", false,
-                                "Ann Example - welcome to Quorvel", true, true, false},
-                      LoginCase{"NoCfgFile", false, "p&ss word", true,
-                                "Could not get details from: %1", false, false, false},
-                      LoginCase{"WrongPassword", true, "wrong", true, "Login failed", true, false,
-                                false}),
-    [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(WindowLoginTest, StartUpSignsInAndEveryLoginFetchesTheListAgain) {
     Start();

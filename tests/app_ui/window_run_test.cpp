@@ -6,7 +6,6 @@
 #include "app/run/run_engine.h"
 #include "support/date_text.h"
 
-#include <QTcpServer>
 #include <QTimer>
 
 namespace quorvel::testing {
@@ -14,20 +13,8 @@ namespace {
 
 class WindowRunTest : public WindowTest {
 protected:
-    // An FTP server text for a loopback port that nobody listens on.
-    static QString DeadServer() {
-        QTcpServer probe;
-        probe.listen(QHostAddress::LocalHost);
-        return QStringLiteral("127.0.0.1:%1").arg(probe.serverPort());
-    }
     // Runs f at the first moment the run lets events through (after the first entry).
     static void DuringTheRun(std::function<void()> f) { QTimer::singleShot(0, f); }
-    QStringList Boxes() const {
-        QStringList shown;
-        for (const auto& box : ports.prompter.shown)
-            shown << box.message;
-        return shown;
-    }
 };
 
 TEST_F(WindowRunTest, DuringARunOnlyCancelIsOfferedAndCloseOnlyStopsTheRun) {

@@ -9,7 +9,6 @@
 #include "app/ui/window_scheduler.h"
 #include "support/program_home.h"
 
-#include <QTcpServer>
 #include <QTimer>
 
 #include <functional>
@@ -48,13 +47,6 @@ protected:
     }
     void Tick() { window->Scheduler().Timer1_Timer(); }
     QString Last() const { return window->Controls().Lbl_LastDownload->text(); }
-
-    // An FTP server text for a loopback port that nobody listens on.
-    static QString DeadServer() {
-        QTcpServer probe;
-        probe.listen(QHostAddress::LocalHost);
-        return QStringLiteral("127.0.0.1:%1").arg(probe.serverPort());
-    }
 
     ManualClock clock{QDateTime(QDate(2024, 11, 1), QTime(10, 20, 0))};
     HookedPrompter prompter;

@@ -65,12 +65,6 @@ protected:
             line = line.section("=>", 0, 0).section('/', -1);
         return lines;
     }
-    QStringList Boxes() const {
-        QStringList shown;
-        for (const auto& box : ports.prompter.shown)
-            shown << box.message;
-        return shown;
-    }
 
     ReferenceService service;
 };
@@ -139,22 +133,6 @@ TEST_F(WindowServiceTest, AListRunsAgainstTheServiceAndASecondRunMovesOnlyWhatAl
     EXPECT_EQ(service.ReadFile("ann", "once.csv"), "sent once\r\n");
     EXPECT_EQ(FtpLog().mid(first.size()),
               (QStringList{"whole.csv", "up.csv", "zd_csv.zip", "zu_csv.zip", "listing.txt"}));
-}
-
-TEST_F(WindowServiceTest, AStoppedServiceFailsTheFileAndNoToContinueStopsTheWalk) {
-    WriteList({Record("Whole", "whole.csv", kDownloadAlways, kUploadNever),
-               Record("Next", "next.csv", kDownloadAlways, kUploadNever)});
-    Start();
-    SignIn();
-    service.Stop();
-    ports.prompter.Script(kAnswerOk);
-    ports.prompter.Script(kAnswerNo);
-    ProcessAll();
-    ASSERT_EQ(Boxes().size(), 2);
-    EXPECT_EQ(Boxes()[0], window->Engine().LastErrorText());
-    EXPECT_FALSE(Boxes()[0].isEmpty());
-    EXPECT_EQ(Boxes()[1], "Continue ?");
-    EXPECT_EQ(C().Lst_Files->currentRow(), 0); // "Next" was never shown
 }
 
 TEST_F(WindowServiceTest, CancelDuringALongDownloadKeepsTheOldCopyAndStopsTheRun) {

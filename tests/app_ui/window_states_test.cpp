@@ -9,7 +9,6 @@
 #include "webdata/talu_web_data.h"
 
 #include <QDir>
-#include <QTcpServer>
 
 #include <utility>
 
@@ -190,14 +189,9 @@ TEST_F(WindowStatesTest, TraceAndWebDataEventsReachStatusAndTraceOneLinePerLine)
 }
 
 TEST_F(WindowStatesTest, FtpTraceFollowsTraceAloneAndItsStatusGoesToTheLabel) {
-    // A loopback port with nobody listening: the connection fails at once.
-    QTcpServer probe;
-    ASSERT_TRUE(probe.listen(QHostAddress::LocalHost));
-    const QString server = QStringLiteral("127.0.0.1:%1").arg(probe.serverPort());
-    probe.close();
     Start();
     C().chk_Log[0]->setChecked(false);
-    C().Txt_ftpServer->setText(server);
+    C().Txt_ftpServer->setText(DeadServer()); // the connection fails at once
     C().Chk_Trace->setChecked(true);
     std::int64_t size = -1;
     EXPECT_FALSE(ftpRemoteFileSize("data/site.csv", size));

@@ -40,17 +40,17 @@ TEST(ServiceAddressTest, TheSchemeChoosesTlsAndTheDefaultPort) {
 TEST(ServiceAddressTest, ASecureRequestNamesHttpsWithTheHostAndPortOfTheText) {
     RequestFields f;
     f.commandIndex = 11;
-    f.command = QStringLiteral("GETUSERFOLDERS");
-    f.user = QStringLiteral("ann");
-    f.password = QStringLiteral("p&ss");
-    f.host = ParseServiceAddress(QStringLiteral("https://h:8443")).hostPort;
-    f.scheme = ServiceScheme(ParseServiceAddress(QStringLiteral("https://h:8443")));
-    f.webFolder = QStringLiteral("/wd");
-    f.agent = QStringLiteral("TALUQuorvel");
+    f.command = "GETUSERFOLDERS";
+    f.user = "ann";
+    f.password = "p&ss";
+    f.host = ParseServiceAddress("https://h:8443").hostPort;
+    f.scheme = ServiceScheme(ParseServiceAddress("https://h:8443"));
+    f.webFolder = "/wd";
+    f.agent = "TALUQuorvel";
     const QStringList lines = RequestLines(f);
     EXPECT_EQ(lines.value(0), QStringLiteral("GET https://h:8443/wd/wd.php?cmd=GETUSERFOLDERS&"
                                              "user=ann&pwd=p%26ss&dt=0&filelocation=0 HTTP/1.1"));
-    EXPECT_EQ(lines.value(1), QStringLiteral("Host: h:8443"));
+    EXPECT_EQ(lines.value(1), "Host: h:8443");
 }
 
 TEST(FtpUrlTest, TheSchemeChoosesImplicitExplicitOrPlainFtp) {

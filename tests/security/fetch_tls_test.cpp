@@ -7,20 +7,17 @@ namespace quorvel::testing {
 namespace {
 
 TEST_F(TlsServiceTest, ConfigurationAndFileListComeOverVerifiedHttps) {
-    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("files.txt"), "site1.dat~1\r\n");
+    service.PlaceFile("ann", "files.txt", "site1.dat~1\r\n");
     QString cfg;
-    ASSERT_TRUE(
-        HTTPGetFileContents(web.Address(TlsSite::Good) + QStringLiteral("/cfg/ann.cfg"), cfg))
+    ASSERT_TRUE(HTTPGetFileContents(web.Address(TlsSite::Good) + "/cfg/ann.cfg", cfg))
         << ftpLastError().toStdString();
-    EXPECT_GE(cfg.split(QStringLiteral("\r\n")).size(), 5) << cfg.toStdString();
+    EXPECT_GE(cfg.split("\r\n").size(), 5) << cfg.toStdString();
     QString list;
     // The scheme in capitals is the same scheme.
-    ASSERT_TRUE(HTTPGetFileContents(QStringLiteral("HTTPS://localhost:") +
-                                        QString::number(web.Port(TlsSite::Good)) +
-                                        QStringLiteral("/ann/files.txt"),
-                                    list))
+    ASSERT_TRUE(HTTPGetFileContents(
+        "HTTPS://localhost:" + QString::number(web.Port(TlsSite::Good)) + "/ann/files.txt", list))
         << ftpLastError().toStdString();
-    EXPECT_EQ(list, QStringLiteral("site1.dat~1\r\n"));
+    EXPECT_EQ(list, "site1.dat~1\r\n");
 }
 
 struct FetchRefusal {
@@ -48,18 +45,17 @@ TEST_F(TlsServiceTest, FetchesAreRefusedWithTheAddressAndTheReason) {
         SCOPED_TRACE(c.name);
         TlsTrust::SetExtraCaFiles(c.trustTestCa ? QStringList{web.CaFile()} : QStringList{});
         const QString url = web.Address(c.site) + QString::fromLatin1(c.path);
-        QString contents = QStringLiteral("old");
+        QString contents = "old";
         EXPECT_FALSE(HTTPGetFileContents(url, contents));
         const QString error = ftpLastError();
-        EXPECT_TRUE(error.startsWith(QStringLiteral("Could not connect to ") + url))
-            << error.toStdString();
+        EXPECT_TRUE(error.startsWith("Could not connect to " + url)) << error.toStdString();
         EXPECT_TRUE(error.contains(QString::fromUtf8(c.reason))) << error.toStdString();
         EXPECT_TRUE(contents.isEmpty());
     }
     // Only the redirecting request was answered; the plain site was never asked.
-    EXPECT_EQ(AccessCount(QStringLiteral("/to-plain/"), 1), 1);
-    EXPECT_FALSE(AccessLog().contains(QString::number(web.Port(TlsSite::Plain)) +
-                                      QStringLiteral(" GET /cfg/ann.cfg")))
+    EXPECT_EQ(AccessCount("/to-plain/", 1), 1);
+    EXPECT_FALSE(
+        AccessLog().contains(QString::number(web.Port(TlsSite::Plain)) + " GET /cfg/ann.cfg"))
         << AccessLog().toStdString();
 }
 

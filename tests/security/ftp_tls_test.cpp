@@ -23,13 +23,13 @@ protected:
         QString error;
         ASSERT_TRUE(MakeTestCertificates(certs.path(), error)) << error.toStdString();
         QDir().mkpath(Root());
-        Write(Root() + QStringLiteral("/site1.dat"), "2006-05-01 10:00:00,1\r\n");
-        TlsTrust::SetExtraCaFiles({certs.filePath(QStringLiteral("ca.pem"))});
+        Write(Root() + "/site1.dat", "2006-05-01 10:00:00,1\r\n");
+        TlsTrust::SetExtraCaFiles({certs.filePath("ca.pem")});
         session.SetDisplay(&trace, nullptr);
     }
     void TearDown() override { TlsTrust::SetExtraCaFiles({}); }
 
-    QString Root() const { return files.filePath(QStringLiteral("root")); }
+    QString Root() const { return files.filePath("root"); }
     static void Write(const QString& path, const QByteArray& bytes) {
         QFile file(path);
         ASSERT_TRUE(file.open(QIODevice::WriteOnly));
@@ -39,11 +39,10 @@ protected:
         QFile file(path);
         return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("<missing>");
     }
-    void Start(const QString& mode, const QString& cert = QStringLiteral("good")) {
-        ASSERT_TRUE(peer.Start(mode, Root(), certs.path(), cert)) << peer.Log().toStdString();
-    }
-    QString Server(const QString& scheme) const {
-        return scheme + QStringLiteral("://localhost:") + QString::number(peer.Port());
+    // A server of the mode and certificate, and the address of a scheme on it.
+    QString Start(FtpsPeer& server, const char* mode, const char* cert, const char* scheme) {
+        EXPECT_TRUE(server.Start(mode, Root(), certs.path(), cert)) << server.Log().toStdString();
+        return QString::fromLatin1(scheme) + "://localhost:" + QString::number(server.Port());
     }
 
     TempHome home;
@@ -52,53 +51,38 @@ protected:
     CountingBusyPointer busy;
     ScopedPorts ports{Ports{&prompter, &clock, &busy}};
     QTemporaryDir certs, files;
-    FtpsPeer peer;
     FtpSession session;
     RecordingTraceView trace;
 };
 
-struct Secure {
-    const char* name;
-    const char* mode;   // of the peer
-    const char* scheme; // of the server text
-};
+TEST_F(FtpTlsTest, DownloadsAndUploadsWithControlAndDataProtected) {
+    const std::pair<const char*, const char*> cases[] = {
+        {"implicit", "ftps"}, {"explicit", "ftpes"}, {"explicit", "FTPES"}}; // mode, scheme
+    for (const auto& [mode, scheme] : cases) {
+        SCOPED_TRACE(scheme);
+        FtpsPeer peer;
+        session.SetDetails(Start(peer, mode, "good", scheme), "logger", "secret", true);
+        const QString local = home.File("site1.dat");
+        ASSERT_TRUE(session.Download("site1.dat", local))
+            << session.LastError().toStdString() << peer.Log().toStdString();
+        EXPECT_EQ(Read(local), "2006-05-01 10:00:00,1\r\n");
+        Write(local, "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n");
+        ASSERT_TRUE(session.Upload(local, "up.dat")) << session.LastError().toStdString();
+        EXPECT_EQ(Read(Root() + "/up.dat"), "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n");
+        session.Close();
 
-class FtpTlsModeTest : public FtpTlsTest, public ::testing::WithParamInterface<Secure> {};
-
-TEST_P(FtpTlsModeTest, DownloadsAndUploadsWithControlAndDataProtected) {
-    Start(QString::fromLatin1(GetParam().mode));
-    session.SetDetails(Server(QString::fromLatin1(GetParam().scheme)), QStringLiteral("logger"),
-                       QStringLiteral("secret"), true);
-    const QString local = home.File(QStringLiteral("site1.dat"));
-    ASSERT_TRUE(session.Download(QStringLiteral("site1.dat"), local))
-        << session.LastError().toStdString() << peer.Log().toStdString();
-    EXPECT_EQ(Read(local), "2006-05-01 10:00:00,1\r\n");
-    Write(local, "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n");
-    ASSERT_TRUE(session.Upload(local, QStringLiteral("up.dat")))
-        << session.LastError().toStdString();
-    EXPECT_EQ(Read(Root() + QStringLiteral("/up.dat")),
-              "2006-05-01 10:00:00,1\r\n2006-05-01 10:10:00,2\r\n");
-    session.Close();
-
-    const QStringList commands = peer.Commands();
-    // Protection is asked for before the first data connection, and every data
-    // connection ran TLS.
-    EXPECT_TRUE(commands.contains(QStringLiteral("PBSZ 0")));
-    EXPECT_TRUE(commands.contains(QStringLiteral("PROT P")));
-    EXPECT_LT(commands.indexOf(QStringLiteral("PROT P")), commands.indexOf(QStringLiteral("EPSV")));
-    EXPECT_EQ(peer.Count(QStringLiteral("DATA TLS"), 2), 2) << peer.Log().toStdString();
-    const bool explicitTls = QString::fromLatin1(GetParam().mode) == QStringLiteral("explicit");
-    EXPECT_EQ(commands.value(0).startsWith(QStringLiteral("AUTH")), explicitTls)
-        << commands.join(QLatin1Char(',')).toStdString();
+        const QStringList commands = peer.Commands();
+        // Protection is asked for before the first data connection, and every data
+        // connection ran TLS.
+        EXPECT_TRUE(commands.contains("PBSZ 0"));
+        EXPECT_TRUE(commands.contains("PROT P"));
+        EXPECT_LT(commands.indexOf("PROT P"), commands.indexOf("EPSV"));
+        EXPECT_EQ(peer.Count("DATA TLS", 2), 2) << peer.Log().toStdString();
+        EXPECT_EQ(commands.value(0).startsWith("AUTH"), QLatin1String(mode) == "explicit")
+            << commands.join(',').toStdString();
+        QFile::remove(Root() + "/up.dat");
+    }
 }
-
-INSTANTIATE_TEST_SUITE_P(Tls, FtpTlsModeTest,
-                         ::testing::Values(Secure{"Implicit", "implicit", "ftps"},
-                                           Secure{"Explicit", "explicit", "ftpes"},
-                                           Secure{"ExplicitCapitals", "explicit", "FTPES"}),
-                         [](const ::testing::TestParamInfo<Secure>& info) {
-                             return std::string(info.param.name);
-                         });
 
 struct FtpRefusal {
     const char* name;
@@ -125,24 +109,19 @@ TEST_F(FtpTlsTest, CertificateAndProtocolFailuresAreRefusedBeforeTheLogIn) {
     for (const FtpRefusal& c : cases) {
         SCOPED_TRACE(c.name);
         FtpsPeer server;
-        ASSERT_TRUE(server.Start(QString::fromLatin1(c.mode), Root(), certs.path(),
-                                 QString::fromLatin1(c.cert)));
-        TlsTrust::SetExtraCaFiles(
-            c.trustTestCa ? QStringList{certs.filePath(QStringLiteral("ca.pem"))} : QStringList{});
-        const QString address = QString::fromLatin1(c.scheme) + QStringLiteral("://localhost:") +
-                                QString::number(server.Port());
-        session.SetDetails(address, QStringLiteral("logger"), QStringLiteral("secret"), true);
-        EXPECT_FALSE(session.Download(QStringLiteral("site1.dat"), home.File(QStringLiteral("x"))));
+        const QString address = Start(server, c.mode, c.cert, c.scheme);
+        TlsTrust::SetExtraCaFiles(c.trustTestCa ? QStringList{certs.filePath("ca.pem")}
+                                                : QStringList{});
+        session.SetDetails(address, "logger", "secret", true);
+        EXPECT_FALSE(session.Download("site1.dat", home.File("x")));
         const QString error = session.LastError();
-        EXPECT_TRUE(error.startsWith(QStringLiteral("Failed ftp access to ") + address))
-            << error.toStdString();
+        EXPECT_TRUE(error.startsWith("Failed ftp access to " + address)) << error.toStdString();
         EXPECT_TRUE(error.contains(QString::fromUtf8(c.reason))) << error.toStdString();
-        EXPECT_FALSE(server.Log().contains(QStringLiteral("CMD USER")))
-            << server.Log().toStdString();
-        EXPECT_FALSE(server.Log().contains(QStringLiteral("CMD PASS")));
+        EXPECT_FALSE(server.Log().contains("CMD USER")) << server.Log().toStdString();
+        EXPECT_FALSE(server.Log().contains("CMD PASS"));
         session.Close();
     }
-    EXPECT_FALSE(QFile::exists(home.File(QStringLiteral("x"))));
+    EXPECT_FALSE(QFile::exists(home.File("x")));
 }
 
 } // namespace

@@ -10,17 +10,15 @@ namespace quorvel::testing {
 
 bool FtpsPeer::Start(const QString& mode, const QString& root, const QString& certFolder,
                      const QString& certStem, const QString& password) {
-    process_.setStandardErrorFile(logDir_.filePath(QStringLiteral("peer.log")));
+    process_.setStandardErrorFile(logDir_.filePath("peer.log"));
     process_.setReadChannel(QProcess::StandardOutput);
-    process_.start(QStringLiteral("/usr/bin/python3"),
-                   {SecurityTestDir() + QStringLiteral("/ftps_peer.py"), mode, root,
-                    QStringLiteral("logger"), password,
-                    certFolder + QLatin1Char('/') + certStem + QStringLiteral(".pem"),
-                    certFolder + QLatin1Char('/') + certStem + QStringLiteral(".key")});
+    process_.start("/usr/bin/python3",
+                   {SecurityTestDir() + "/ftps_peer.py", mode, root, "logger", password,
+                    certFolder + '/' + certStem + ".pem", certFolder + '/' + certStem + ".key"});
     if (!process_.waitForStarted(10000) || !process_.waitForReadyRead(10000)) return false;
     port_ = process_.readLine().trimmed().toInt();
     QTcpSocket probe;
-    probe.connectToHost(QStringLiteral("127.0.0.1"), static_cast<quint16>(port_));
+    probe.connectToHost("127.0.0.1", static_cast<quint16>(port_));
     return port_ > 0 && probe.waitForConnected(5000);
 }
 
@@ -31,7 +29,7 @@ void FtpsPeer::Stop() {
 }
 
 QString FtpsPeer::Log() const {
-    QFile file(logDir_.filePath(QStringLiteral("peer.log")));
+    QFile file(logDir_.filePath("peer.log"));
     return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : QString();
 }
 
@@ -42,10 +40,10 @@ int FtpsPeer::Count(const QString& text, int expected) const {
 }
 
 QStringList FtpsPeer::Commands(int expected) const {
-    const QString tag = QStringLiteral("CMD ");
+    const QString tag = "CMD ";
     Count(tag, expected);
     QStringList commands;
-    for (const QString& line : Log().split(QLatin1Char('\n')))
+    for (const QString& line : Log().split('\n'))
         if (line.startsWith(tag)) commands << line.mid(tag.size());
     return commands;
 }

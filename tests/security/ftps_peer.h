@@ -15,8 +15,7 @@ public:
     // mode: "implicit", "explicit" or "plain"; certStem names a certificate
     // of make_certs.py in certFolder ("good", "expired", ...).
     bool Start(const QString& mode, const QString& root, const QString& certFolder,
-               const QString& certStem = QStringLiteral("good"),
-               const QString& password = QStringLiteral("secret"));
+               const QString& certStem = "good", const QString& password = "secret");
     void Stop();
     int Port() const { return port_; }
     QString Log() const;

@@ -19,7 +19,7 @@
 namespace quorvel::testing {
 namespace {
 
-const QString kFtpPassword = QStringLiteral("Pw-9ftp#x:y@z");
+const QString kFtpPassword = "Pw-9ftp#x:y@z";
 
 QString Encoded(const QString& password) {
     return QString::fromLatin1(QUrl::toPercentEncoding(password));
@@ -60,28 +60,36 @@ QString ReadFile(const QString& path) {
     return file.open(QIODevice::ReadOnly) ? QString::fromUtf8(file.readAll()) : QString();
 }
 
+// Each output, by name, holds no part of the service's or the FTP password.
+void ExpectNoPassword(const QMap<QString, QString>& outputs) {
+    for (auto it = outputs.begin(); it != outputs.end(); ++it) {
+        SCOPED_TRACE(it.key().toStdString());
+        for (const char* secret : {"Tr0ub", "Pw-9ftp"})
+            EXPECT_FALSE(it.value().contains(secret)) << it.value().toStdString();
+    }
+}
+
 TEST_F(TlsServiceTest, NoOutputEverShowsAPassword) {
     QTemporaryDir certs, ftpRoot;
     QString error;
     ASSERT_TRUE(MakeTestCertificates(certs.path(), error)) << error.toStdString();
-    TlsTrust::SetExtraCaFiles({web.CaFile(), certs.filePath(QStringLiteral("ca.pem"))});
-    QFile(ftpRoot.filePath(QStringLiteral("site1.dat"))).open(QIODevice::WriteOnly);
+    TlsTrust::SetExtraCaFiles({web.CaFile(), certs.filePath("ca.pem")});
+    QFile(ftpRoot.filePath("site1.dat")).open(QIODevice::WriteOnly);
     FtpsPeer ftp;
-    ASSERT_TRUE(ftp.Start(QStringLiteral("explicit"), ftpRoot.path(), certs.path(),
-                          QStringLiteral("good"), kFtpPassword));
+    ASSERT_TRUE(ftp.Start("explicit", ftpRoot.path(), certs.path(), "good", kFtpPassword));
     RecordingTraceView ftpTrace;
     SetFTPDisplay(&ftpTrace, nullptr);
     // curl prints its verbose text to standard error when nothing takes it.
-    StderrCapture captured(home.File(QStringLiteral("stderr.txt")));
+    StderrCapture captured(home.File("stderr.txt"));
 
     // The service: success, a refused password, a refused certificate, a
     // password with every character a careless request would break on.
     object.SetRemoteHost(web.Address(TlsSite::Good));
     ASSERT_TRUE(object.Initialise()) << object.LastError().toStdString();
-    const QString local = home.Write(QStringLiteral("site1.dat"), "");
+    const QString local = home.Write("site1.dat", "");
     object.GetNewData(local, 1, 1);
     QStringList lastErrors{object.LastError()};
-    object.SetPassword(kAnnPassword + QStringLiteral("\r\nX-Injected: 1"));
+    object.SetPassword(kAnnPassword + "\r\nX-Injected: 1");
     EXPECT_FALSE(object.Initialise());
     lastErrors << object.LastError();
     ShortGap();
@@ -93,36 +101,30 @@ TEST_F(TlsServiceTest, NoOutputEverShowsAPassword) {
     // Fetches with the password inside the address, traced (curl's waits
     // follow the reply gap: a sanitizer build's handshakes are slow).
     clock.SetWaits(WaitLengths{.replyGap = std::chrono::milliseconds(5000)});
-    const QString site = QStringLiteral("@localhost:") + QString::number(web.Port(TlsSite::Good));
-    const QString withUser = QStringLiteral("https://ann:") + Encoded(kAnnPassword) + site;
-    SetFTPDetails(QStringLiteral("localhost"), QStringLiteral("logger"), kFtpPassword, true);
+    const QString site = "@localhost:" + QString::number(web.Port(TlsSite::Good));
+    const QString withUser = "https://ann:" + Encoded(kAnnPassword) + site;
+    SetFTPDetails("localhost", "logger", kFtpPassword, true);
     QString body;
-    EXPECT_TRUE(HTTPGetFileContents(withUser + QStringLiteral("/cfg/ann.cfg"), body))
+    EXPECT_TRUE(HTTPGetFileContents(withUser + "/cfg/ann.cfg", body))
         << ftpLastError().toStdString();
-    EXPECT_FALSE(HTTPGetFileContents(withUser + QStringLiteral("/nothing"), body));
+    EXPECT_FALSE(HTTPGetFileContents(withUser + "/nothing", body));
     lastErrors << ftpLastError();
     // Typed into the address unescaped, it makes no valid address, and is not shown either.
-    EXPECT_FALSE(HTTPGetFileContents(QStringLiteral("https://ann:") + kAnnPassword + site +
-                                         QStringLiteral("/cfg/ann.cfg"),
-                                     body));
+    EXPECT_FALSE(HTTPGetFileContents("https://ann:" + kAnnPassword + site + "/cfg/ann.cfg", body));
     lastErrors << ftpLastError();
 
     // FTP over TLS, the password given apart and inside the server address.
-    const QString ftpHost = QStringLiteral("localhost:") + QString::number(ftp.Port());
-    SetFTPDetails(QStringLiteral("ftpes://logger:") + Encoded(kFtpPassword) + QLatin1Char('@') +
-                      ftpHost,
-                  QStringLiteral("logger"), kFtpPassword, true);
-    EXPECT_TRUE(ftpDownLoadFile(QStringLiteral("site1.dat"), home.File(QStringLiteral("f.dat"))))
-        << ftpLastError().toStdString();
-    EXPECT_FALSE(ftpDownLoadFile(QStringLiteral("missing.dat"), home.File(QStringLiteral("g"))));
+    const QString ftpHost = "localhost:" + QString::number(ftp.Port());
+    SetFTPDetails("ftpes://logger:" + Encoded(kFtpPassword) + '@' + ftpHost, "logger", kFtpPassword,
+                  true);
+    EXPECT_TRUE(ftpDownLoadFile("site1.dat", home.File("f.dat"))) << ftpLastError().toStdString();
+    EXPECT_FALSE(ftpDownLoadFile("missing.dat", home.File("g")));
     lastErrors << ftpLastError();
-    SetFTPDetails(QStringLiteral("ftpes://logger:") + kFtpPassword + QLatin1Char('@') + ftpHost,
-                  QStringLiteral("logger"), kFtpPassword, true);
-    EXPECT_FALSE(ftpDownLoadFile(QStringLiteral("site1.dat"), home.File(QStringLiteral("h"))));
+    SetFTPDetails("ftpes://logger:" + kFtpPassword + '@' + ftpHost, "logger", kFtpPassword, true);
+    EXPECT_FALSE(ftpDownLoadFile("site1.dat", home.File("h")));
     lastErrors << ftpLastError();
-    SetFTPDetails(QStringLiteral("ftpes://") + ftpHost, QStringLiteral("logger"),
-                  QStringLiteral("wrong ") + kFtpPassword, true);
-    EXPECT_FALSE(ftpUploadFile(local, QStringLiteral("up.dat")));
+    SetFTPDetails("ftpes://" + ftpHost, "logger", "wrong " + kFtpPassword, true);
+    EXPECT_FALSE(ftpUploadFile(local, "up.dat"));
     lastErrors << ftpLastError();
     ftpClose();
     SetFTPDisplay(nullptr, nullptr);
@@ -131,27 +133,22 @@ TEST_F(TlsServiceTest, NoOutputEverShowsAPassword) {
     for (const auto& shown : prompter.shown)
         boxes << shown.message;
     const QMap<QString, QString> outputs{
-        {QStringLiteral("web-data traces"), traces.join(QLatin1Char('\n'))},
-        {QStringLiteral("status texts"), statuses.join(QLatin1Char('\n'))},
-        {QStringLiteral("FTP traces"), ftpTrace.traces.join(QLatin1Char('\n'))},
-        {QStringLiteral("FTP status texts"), ftpTrace.statuses.join(QLatin1Char('\n'))},
-        {QStringLiteral("message boxes"), boxes.join(QLatin1Char('\n'))},
-        {QStringLiteral("error texts"), lastErrors.join(QLatin1Char('\n'))},
-        {QStringLiteral("program log"), ProgramLog()},
-        {QStringLiteral("ftp.log"), ReadFile(ProgramHome::FtpLogFile())},
-        {QStringLiteral("standard error"), captured.Text()},
+        {"web-data traces", traces.join('\n')},
+        {"status texts", statuses.join('\n')},
+        {"FTP traces", ftpTrace.traces.join('\n')},
+        {"FTP status texts", ftpTrace.statuses.join('\n')},
+        {"message boxes", boxes.join('\n')},
+        {"error texts", lastErrors.join('\n')},
+        {"program log", ProgramLog()},
+        {"ftp.log", ReadFile(ProgramHome::FtpLogFile())},
+        {"standard error", captured.Text()},
     };
     // The outputs did record the exchanges: an empty check would pass anyway.
-    EXPECT_TRUE(
-        outputs.value(QStringLiteral("web-data traces")).contains(QStringLiteral("pwd=***")));
-    EXPECT_TRUE(outputs.value(QStringLiteral("FTP traces")).contains(QStringLiteral("Getting: ")));
-    EXPECT_TRUE(outputs.value(QStringLiteral("ftp.log")).contains(QStringLiteral("site1.dat")));
-    EXPECT_TRUE(outputs.value(QStringLiteral("program log")).contains(QStringLiteral("S>GET")));
-    for (auto it = outputs.begin(); it != outputs.end(); ++it) {
-        SCOPED_TRACE(it.key().toStdString());
-        for (const QString& secret : {QStringLiteral("Tr0ub"), QStringLiteral("Pw-9ftp")})
-            EXPECT_FALSE(it.value().contains(secret)) << it.value().toStdString();
-    }
+    EXPECT_TRUE(outputs.value("web-data traces").contains("pwd=***"));
+    EXPECT_TRUE(outputs.value("FTP traces").contains("Getting: "));
+    EXPECT_TRUE(outputs.value("ftp.log").contains("site1.dat"));
+    EXPECT_TRUE(outputs.value("program log").contains("S>GET"));
+    ExpectNoPassword(outputs);
 }
 
 // The command-line run, as cron would see it: what it prints, what it writes
@@ -160,49 +157,43 @@ TEST_F(TlsServiceTest, NoOutputEverShowsAPassword) {
 TEST(CommandLineRunPasswords, NoOutputOfTheCommandLineRunShowsAPassword) {
     TempHome home;
     ReferenceService service;
-    ASSERT_TRUE(service.AddUser({.name = QStringLiteral("ann"),
-                                 .password = QStringLiteral("Tr0ub-cli&pw d"),
-                                 .ftpPassword = QStringLiteral("Pw-9ftp-cli")}))
+    ASSERT_TRUE(service.AddUser(
+        {.name = "ann", .password = "Tr0ub-cli&pw d", .ftpPassword = "Pw-9ftp-cli"}))
         << service.LastError().toStdString();
-    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("site1.dat"),
-                      "2024-11-01 10:00:00,1\r\n");
-    service.PlaceFile(QStringLiteral("ann"), QStringLiteral("files.txt"),
+    service.PlaceFile("ann", "site1.dat", "2024-11-01 10:00:00,1\r\n");
+    service.PlaceFile("ann", "files.txt",
                       " 1 ~1~Site~site1.dat~1~2~1~1~0~1~0~~~0\r\n"
                       " 2 ~1~Whole~site1.dat~0~2~1~0~0~1~0~~~0\r\n"
                       " 3 ~1~Gone~gone.dat~0~2~1~0~0~1~0~~~0\r\n");
     ASSERT_TRUE(service.Start()) << service.LastError().toStdString();
-    LocalSettings settings(home.File(QStringLiteral("quorvel.ini")));
-    settings.SaveLocalSetting(QStringLiteral("CFG_URL"), service.CfgUrl(QStringLiteral("ann")));
-    settings.SaveLocalSetting(QStringLiteral("UserID"), QStringLiteral("ann"));
-    settings.SaveLocalSetting(QStringLiteral("Password"), QStringLiteral("Tr0ub-cli&pw d"));
-    settings.SaveLocalSetting(QStringLiteral("DataFolder"), home.File(QStringLiteral("data")));
+    LocalSettings settings(home.File("quorvel.ini"));
+    settings.SaveLocalSetting("CFG_URL", service.CfgUrl("ann"));
+    settings.SaveLocalSetting("UserID", "ann");
+    settings.SaveLocalSetting("Password", "Tr0ub-cli&pw d");
+    settings.SaveLocalSetting("DataFolder", home.File("data"));
 
     CommandLineProcess cli(home.Path());
     QStringList printed;
-    const auto good = cli.Run({QStringLiteral("--run-all")});
+    const auto good = cli.Run({"--run-all"});
     EXPECT_EQ(good.code, 1) << good.err.toStdString(); // gone.dat fails
     printed << good.out << good.err;
-    const auto dry = cli.Run({QStringLiteral("--run-all"), QStringLiteral("--dry-run")});
+    const auto dry = cli.Run({"--run-all", "--dry-run"});
     printed << dry.out << dry.err;
-    settings.SaveLocalSetting(QStringLiteral("Password"), QStringLiteral("Tr0ub-cli&pw wrong"));
-    const auto refused = cli.Run({QStringLiteral("--run-all")});
+    settings.SaveLocalSetting("Password", "Tr0ub-cli&pw wrong");
+    const auto refused = cli.Run({"--run-all"});
     EXPECT_EQ(refused.code, 2);
     printed << refused.out << refused.err;
 
     const QMap<QString, QString> outputs{
-        {QStringLiteral("standard output and error"), printed.join(QLatin1Char('\n'))},
-        {QStringLiteral("program log"), ReadFile(home.File(QStringLiteral("quorvel.log")))},
-        {QStringLiteral("ftp.log"), ReadFile(home.File(QStringLiteral("ftp.log")))},
+        {"standard output and error", printed.join('\n')},
+        {"program log", ReadFile(home.File("quorvel.log"))},
+        {"ftp.log", ReadFile(home.File("ftp.log"))},
     };
-    const QString printedText = outputs.value(QStringLiteral("standard output and error"));
-    EXPECT_TRUE(printedText.contains(QStringLiteral("Login failed"))) << printedText.toStdString();
-    EXPECT_TRUE(printedText.contains(QStringLiteral("[3/3] Gone: failed")));
-    EXPECT_TRUE(outputs.value(QStringLiteral("ftp.log")).contains(QStringLiteral("site1.dat")));
-    for (auto it = outputs.begin(); it != outputs.end(); ++it) {
-        SCOPED_TRACE(it.key().toStdString());
-        for (const QString& secret : {QStringLiteral("Tr0ub"), QStringLiteral("Pw-9ftp")})
-            EXPECT_FALSE(it.value().contains(secret)) << it.value().toStdString();
-    }
+    const QString printedText = outputs.value("standard output and error");
+    EXPECT_TRUE(printedText.contains("Login failed")) << printedText.toStdString();
+    EXPECT_TRUE(printedText.contains("[3/3] Gone: failed"));
+    EXPECT_TRUE(outputs.value("ftp.log").contains("site1.dat"));
+    ExpectNoPassword(outputs);
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 // private D-Bus session, see with_keyring.sh), the fallback to the owner-only
 // settings file without one, and the keeping rules between the two.
 #include "common/temp_home.h"
+#include "fake_secret_store.h"
 #include "support/ini_store.h"
 #include "support/password_keeper.h"
 #include "support/program_home.h"
@@ -9,7 +10,6 @@
 
 #include <QElapsedTimer>
 #include <QFile>
-#include <QMap>
 
 #include <gtest/gtest.h>
 
@@ -21,7 +21,7 @@ namespace {
 using namespace std::chrono_literals;
 using Status = SecretStore::Status;
 
-const QString kPassword = QStringLiteral("Tr0ub&dor 3=x");
+const QString kPassword = "Tr0ub&dor 3=x";
 
 QString Read(const QString& path) {
     QFile file(path);
@@ -30,32 +30,12 @@ QString Read(const QString& path) {
 
 // ---- the keeping rules, over a store the test controls ----
 
-class FakeStore : public SecretStore {
-public:
-    Result Read(const QString& key) override {
-        if (!answers) return {Status::Unavailable, {}, QStringLiteral("no bus")};
-        if (!entries.contains(key)) return {Status::NotFound, {}, {}};
-        return {Status::Ok, entries.value(key), {}};
-    }
-    Result Write(const QString& key, const QString& secret) override {
-        if (!answers) return {Status::Unavailable, {}, QStringLiteral("no bus")};
-        entries[key] = secret;
-        return {Status::Ok, {}, {}};
-    }
-    Result Remove(const QString& key) override {
-        if (!answers) return {Status::Unavailable, {}, QStringLiteral("no bus")};
-        return {entries.remove(key) ? Status::Ok : Status::NotFound, {}, {}};
-    }
-    bool answers = true;
-    QMap<QString, QString> entries;
-};
-
 class KeeperTest : public ::testing::Test {
 protected:
     KeeperTest() { PasswordKeeper::ResetLogMemory(); }
     QString SettingsText() const { return Read(settings.Path()); }
     QString Log() const { return Read(ProgramHome::LogFile()); }
-    QString StoreKey() const { return settings.Path() + QStringLiteral("|Password"); }
+    QString StoreKey() const { return settings.Path() + "|Password"; }
 
     TempHome home;
     LocalSettings settings{ProgramHome::SettingsFile()};
@@ -64,26 +44,26 @@ protected:
 
 TEST_F(KeeperTest, WithAStoreTheSettingsFileHoldsNoPassword) {
     PasswordKeeper keeper(settings, &store);
-    ASSERT_TRUE(keeper.Save(QStringLiteral("Password"), kPassword));
+    ASSERT_TRUE(keeper.Save("Password", kPassword));
     EXPECT_EQ(store.entries.value(StoreKey()), kPassword);
-    EXPECT_TRUE(SettingsText().contains(QStringLiteral("Password=Null")));
-    EXPECT_FALSE(SettingsText().contains(QStringLiteral("Tr0ub")));
-    EXPECT_EQ(PasswordKeeper(settings, &store).Load(QStringLiteral("Password")), kPassword);
+    EXPECT_TRUE(SettingsText().contains("Password=Null"));
+    EXPECT_FALSE(SettingsText().contains("Tr0ub"));
+    EXPECT_EQ(PasswordKeeper(settings, &store).Load("Password"), kPassword);
     // An emptied password leaves nothing behind in the store either.
-    ASSERT_TRUE(keeper.Save(QStringLiteral("Password"), QString()));
+    ASSERT_TRUE(keeper.Save("Password", QString()));
     EXPECT_TRUE(store.entries.isEmpty());
     EXPECT_EQ(keeper.LastPlace(), PasswordKeeper::Place::SecretStore);
 }
 
 TEST_F(KeeperTest, APasswordLeftInTheFileIsMovedIntoTheStoreOnceItAnswers) {
-    settings.SaveLocalSetting(QStringLiteral("Password"), kPassword);
+    settings.SaveLocalSetting("Password", kPassword);
     store.answers = false;
-    EXPECT_EQ(PasswordKeeper(settings, &store).Load(QStringLiteral("Password")), kPassword);
+    EXPECT_EQ(PasswordKeeper(settings, &store).Load("Password"), kPassword);
     EXPECT_TRUE(SettingsText().contains(kPassword)); // kept where it is
     store.answers = true;
-    store.entries[StoreKey()] = QStringLiteral("older");
+    store.entries[StoreKey()] = "older";
     // The file's copy was written while the store was away: it is the newer one.
-    EXPECT_EQ(PasswordKeeper(settings, &store).Load(QStringLiteral("Password")), kPassword);
+    EXPECT_EQ(PasswordKeeper(settings, &store).Load("Password"), kPassword);
     EXPECT_EQ(store.entries.value(StoreKey()), kPassword);
     EXPECT_FALSE(SettingsText().contains(kPassword));
 }
@@ -91,24 +71,24 @@ TEST_F(KeeperTest, APasswordLeftInTheFileIsMovedIntoTheStoreOnceItAnswers) {
 TEST_F(KeeperTest, WithoutAStoreThePasswordStaysInTheFileAndTheLogSaysSoOnce) {
     store.answers = false;
     PasswordKeeper keeper(settings, &store);
-    ASSERT_TRUE(keeper.Save(QStringLiteral("Password"), kPassword));
-    ASSERT_TRUE(keeper.Save(QStringLiteral("FtpPassword"), QStringLiteral("ftp-secret")));
-    EXPECT_EQ(keeper.Load(QStringLiteral("Password")), kPassword);
+    ASSERT_TRUE(keeper.Save("Password", kPassword));
+    ASSERT_TRUE(keeper.Save("FtpPassword", "ftp-secret"));
+    EXPECT_EQ(keeper.Load("Password"), kPassword);
     EXPECT_EQ(keeper.LastPlace(), PasswordKeeper::Place::SettingsFile);
-    EXPECT_EQ(keeper.StoreProblem(), QStringLiteral("no bus"));
-    const QString told = PasswordKeeper::PlaceText(PasswordKeeper::Place::SettingsFile,
-                                                   settings.Path(), QStringLiteral("no bus"));
+    EXPECT_EQ(keeper.StoreProblem(), "no bus");
+    const QString told =
+        PasswordKeeper::PlaceText(PasswordKeeper::Place::SettingsFile, settings.Path(), "no bus");
     EXPECT_EQ(Log().count(told), 1) << Log().toStdString();
     // Where it is kept changes: the log says it again, once.
     store.answers = true;
-    keeper.Save(QStringLiteral("Password"), kPassword);
-    keeper.Save(QStringLiteral("FtpPassword"), QStringLiteral("ftp-secret"));
-    EXPECT_EQ(Log().count(QStringLiteral("kept in the desktop's secret store")), 1);
-    EXPECT_FALSE(SettingsText().contains(QStringLiteral("ftp-secret")));
+    keeper.Save("Password", kPassword);
+    keeper.Save("FtpPassword", "ftp-secret");
+    EXPECT_EQ(Log().count("kept in the desktop's secret store"), 1);
+    EXPECT_FALSE(SettingsText().contains("ftp-secret"));
     // A keeper without any store (the settings file alone) behaves as described.
     PasswordKeeper plain(settings, nullptr);
-    ASSERT_TRUE(plain.Save(QStringLiteral("Password"), kPassword));
-    EXPECT_TRUE(SettingsText().contains(QStringLiteral("Password=") + kPassword));
+    ASSERT_TRUE(plain.Save("Password", kPassword));
+    EXPECT_TRUE(SettingsText().contains("Password=" + kPassword));
 }
 
 // ---- the real store ----
@@ -116,24 +96,23 @@ TEST_F(KeeperTest, WithoutAStoreThePasswordStaysInTheFileAndTheLogSaysSoOnce) {
 // The keyring runs only under with_keyring.sh (CTest); run by hand, these
 // tests must not touch the desktop's own keyring.
 bool InPrivateKeyring() {
-    return qEnvironmentVariable("QUORVEL_TEST_KEYRING") == QStringLiteral("1");
+    return qEnvironmentVariable("QUORVEL_TEST_KEYRING") == "1";
 }
 bool WithoutAnyBus() {
-    return qEnvironmentVariable("QUORVEL_TEST_KEYRING") == QStringLiteral("none");
+    return qEnvironmentVariable("QUORVEL_TEST_KEYRING") == "none";
 }
 
 TEST(KeyringStore, KeepsReplacesAndRemovesAPassword) {
     if (!InPrivateKeyring()) GTEST_SKIP() << "runs inside with_keyring.sh only";
     const auto store = MakeDesktopSecretStore(10s);
-    const QString key = QStringLiteral("/home/ann/.config/quorvel/quorvel.ini|Password");
+    const QString key = "/home/ann/.config/quorvel/quorvel.ini|Password";
     const SecretStore::Result written = store->Write(key, kPassword);
     ASSERT_EQ(written.status, Status::Ok) << written.error.toStdString();
     EXPECT_EQ(store->Read(key).secret, kPassword);
-    ASSERT_EQ(store->Write(key, QStringLiteral("second")).status, Status::Ok);
-    EXPECT_EQ(store->Read(key).secret, QStringLiteral("second"));
+    ASSERT_EQ(store->Write(key, "second").status, Status::Ok);
+    EXPECT_EQ(store->Read(key).secret, "second");
     // Another program home has its own entry.
-    EXPECT_EQ(store->Read(QStringLiteral("/elsewhere/quorvel.ini|Password")).status,
-              Status::NotFound);
+    EXPECT_EQ(store->Read("/elsewhere/quorvel.ini|Password").status, Status::NotFound);
     EXPECT_EQ(store->Remove(key).status, Status::Ok);
     EXPECT_EQ(store->Read(key).status, Status::NotFound);
 }
@@ -143,24 +122,24 @@ TEST(KeyringStore, TheKeeperLeavesNoPasswordInTheSettingsFile) {
     TempHome home;
     PasswordKeeper::ResetLogMemory();
     LocalSettings settings(ProgramHome::SettingsFile());
-    settings.SaveLocalSetting(QStringLiteral("Password"), kPassword); // from an older run
+    settings.SaveLocalSetting("Password", kPassword); // from an older run
     const auto store = MakeDesktopSecretStore(10s);
     {
         PasswordKeeper keeper(settings, store.get());
-        EXPECT_EQ(keeper.Load(QStringLiteral("Password")), kPassword);
+        EXPECT_EQ(keeper.Load("Password"), kPassword);
         EXPECT_EQ(keeper.LastPlace(), PasswordKeeper::Place::SecretStore)
             << keeper.StoreProblem().toStdString();
-        ASSERT_TRUE(keeper.Save(QStringLiteral("FtpPassword"), QStringLiteral("ftp-secret")));
+        ASSERT_TRUE(keeper.Save("FtpPassword", "ftp-secret"));
     }
     const QString file = Read(settings.Path());
-    EXPECT_FALSE(file.contains(QStringLiteral("Tr0ub"))) << file.toStdString();
-    EXPECT_FALSE(file.contains(QStringLiteral("ftp-secret")));
+    EXPECT_FALSE(file.contains("Tr0ub")) << file.toStdString();
+    EXPECT_FALSE(file.contains("ftp-secret"));
     // A later run (a new store object, as after a restart) finds both.
     const auto again = MakeDesktopSecretStore(10s);
     PasswordKeeper later(settings, again.get());
-    EXPECT_EQ(later.Load(QStringLiteral("Password")), kPassword);
-    EXPECT_EQ(later.Load(QStringLiteral("FtpPassword")), QStringLiteral("ftp-secret"));
-    EXPECT_EQ(Read(ProgramHome::LogFile()).count(QStringLiteral("secret store")), 1);
+    EXPECT_EQ(later.Load("Password"), kPassword);
+    EXPECT_EQ(later.Load("FtpPassword"), "ftp-secret");
+    EXPECT_EQ(Read(ProgramHome::LogFile()).count("secret store"), 1);
 }
 
 TEST(NoSecretStore, AnswersUnavailableAtOnceAndTheKeeperFallsBackToTheFile) {
@@ -170,18 +149,17 @@ TEST(NoSecretStore, AnswersUnavailableAtOnceAndTheKeeperFallsBackToTheFile) {
     const auto store = MakeDesktopSecretStore(10s);
     QElapsedTimer timer;
     timer.start();
-    const SecretStore::Result read = store->Read(QStringLiteral("x|Password"));
+    const SecretStore::Result read = store->Read("x|Password");
     EXPECT_EQ(read.status, Status::Unavailable);
     EXPECT_FALSE(read.error.isEmpty());
     EXPECT_LT(timer.elapsed(), 5000); // no waiting for the limit
     LocalSettings settings(ProgramHome::SettingsFile());
     PasswordKeeper keeper(settings, store.get());
-    ASSERT_TRUE(keeper.Save(QStringLiteral("Password"), kPassword));
-    EXPECT_EQ(keeper.Load(QStringLiteral("Password")), kPassword);
+    ASSERT_TRUE(keeper.Save("Password", kPassword));
+    EXPECT_EQ(keeper.Load("Password"), kPassword);
     EXPECT_EQ(keeper.LastPlace(), PasswordKeeper::Place::SettingsFile);
     const QString log = Read(ProgramHome::LogFile());
-    EXPECT_EQ(
-        log.count(QStringLiteral("passwords are kept in the settings file ") + settings.Path()), 1)
+    EXPECT_EQ(log.count("passwords are kept in the settings file " + settings.Path()), 1)
         << log.toStdString();
 }
 

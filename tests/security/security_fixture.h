@@ -24,22 +24,21 @@
 namespace quorvel::testing {
 
 // Characters that a careless request or log would break or show.
-inline const QString kAnnPassword = QStringLiteral("Tr0ub&dor 3+%=?#");
+inline const QString kAnnPassword = "Tr0ub&dor 3+%=?#";
 
 class TlsServiceTest : public ::testing::Test {
 protected:
     void SetUp() override {
         clock.SetWaits(WaitLengths{.replyGap = std::chrono::milliseconds(5000)});
-        ASSERT_TRUE(service.AddUser({.name = QStringLiteral("ann"),
-                                     .password = kAnnPassword,
-                                     .displayName = QStringLiteral("Ann Example")}))
+        ASSERT_TRUE(service.AddUser(
+            {.name = "ann", .password = kAnnPassword, .displayName = "Ann Example"}))
             << service.LastError().toStdString();
         ASSERT_TRUE(web.Start(service.DataRoot())) << web.LastError().toStdString();
         TlsTrust::SetExtraCaFiles({web.CaFile()});
         object.MyWinsock(&socket);
-        object.SetAgent(QStringLiteral("TALUQuorvel"));
-        object.SetWebFolder(QStringLiteral("/wd"));
-        object.SetUserID(QStringLiteral("ann"));
+        object.SetAgent("TALUQuorvel");
+        object.SetWebFolder("/wd");
+        object.SetUserID("ann");
         object.SetPassword(kAnnPassword);
         object.SetProgramEnder([this] { ++programEnds; });
         for (int which = 0; which < 5; ++which)

@@ -2,34 +2,18 @@
 // store when there is one, and in the settings file otherwise.
 #include "app/app_settings.h"
 #include "common/temp_home.h"
+#include "fake_secret_store.h"
 #include "support/ini_store.h"
 #include "support/password_keeper.h"
 #include "support/program_home.h"
 #include "support/secret_store.h"
 
 #include <QFile>
-#include <QMap>
 
 #include <gtest/gtest.h>
 
 namespace quorvel::testing {
 namespace {
-
-class MapStore : public SecretStore {
-public:
-    Result Read(const QString& key) override {
-        if (!entries.contains(key)) return {Status::NotFound, {}, {}};
-        return {Status::Ok, entries.value(key), {}};
-    }
-    Result Write(const QString& key, const QString& secret) override {
-        entries[key] = secret;
-        return {Status::Ok, {}, {}};
-    }
-    Result Remove(const QString& key) override {
-        return {entries.remove(key) ? Status::Ok : Status::NotFound, {}, {}};
-    }
-    QMap<QString, QString> entries;
-};
 
 QString FileText(const QString& path) {
     QFile file(path);
@@ -41,30 +25,29 @@ TEST(SettingsPassword, GoesToTheStoreWhenThereIsOneAndStaysInTheFileOtherwise) {
     PasswordKeeper::ResetLogMemory();
     LocalSettings settings(ProgramHome::SettingsFile());
     AppSettings values = AppSettings::Defaults(home.Path(), 2024);
-    values.userId = QStringLiteral("ann");
-    values.password = QStringLiteral("p&ss word");
+    values.userId = "ann";
+    values.password = "p&ss word";
 
     // Without a store, as described: the owner-only file holds it.
     ASSERT_TRUE(values.Save(settings));
-    EXPECT_TRUE(FileText(settings.Path()).contains(QStringLiteral("Password=p&ss word")));
+    EXPECT_TRUE(FileText(settings.Path()).contains("Password=p&ss word"));
 
-    MapStore store;
+    FakeStore store;
     SetProcessSecretStore(&store);
     AppSettings loaded;
     ASSERT_FALSE(loaded.Load(settings, home.Path(), 2024));
-    EXPECT_EQ(loaded.password, QStringLiteral("p&ss word"));
+    EXPECT_EQ(loaded.password, "p&ss word");
     // Read once with a store there, the password left the file.
-    EXPECT_EQ(store.entries.value(settings.Path() + QStringLiteral("|Password")),
-              QStringLiteral("p&ss word"));
-    EXPECT_FALSE(FileText(settings.Path()).contains(QStringLiteral("p&ss")));
+    EXPECT_EQ(store.entries.value(settings.Path() + "|Password"), "p&ss word");
+    EXPECT_FALSE(FileText(settings.Path()).contains("p&ss"));
 
-    loaded.password = QStringLiteral("changed");
+    loaded.password = "changed";
     ASSERT_TRUE(loaded.Save(settings));
-    EXPECT_TRUE(FileText(settings.Path()).contains(QStringLiteral("Password=Null")));
-    EXPECT_FALSE(FileText(settings.Path()).contains(QStringLiteral("changed")));
+    EXPECT_TRUE(FileText(settings.Path()).contains("Password=Null"));
+    EXPECT_FALSE(FileText(settings.Path()).contains("changed"));
     AppSettings again;
     ASSERT_FALSE(again.Load(settings, home.Path(), 2024));
-    EXPECT_EQ(again.password, QStringLiteral("changed"));
+    EXPECT_EQ(again.password, "changed");
     SetProcessSecretStore(nullptr);
 }
 

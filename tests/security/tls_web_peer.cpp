@@ -30,14 +30,13 @@ bool WriteText(const QString& path, const QString& text) {
 
 bool Accepts(int port) {
     QTcpSocket probe;
-    probe.connectToHost(QStringLiteral("127.0.0.1"), static_cast<quint16>(port));
+    probe.connectToHost("127.0.0.1", static_cast<quint16>(port));
     return probe.waitForConnected(200);
 }
 
 QString PhpFpmProgram() {
-    const QStringList found =
-        QDir(QStringLiteral("/usr/sbin")).entryList({QStringLiteral("php-fpm*")}, QDir::Files);
-    return found.isEmpty() ? QString() : QStringLiteral("/usr/sbin/") + found.first();
+    const QStringList found = QDir("/usr/sbin").entryList({"php-fpm*"}, QDir::Files);
+    return found.isEmpty() ? QString() : "/usr/sbin/" + found.first();
 }
 
 // Run as root (CI), both servers must be told to stay root; otherwise nginx's
@@ -81,30 +80,30 @@ TlsWebPeer::~TlsWebPeer() {
 }
 
 bool TlsWebPeer::Fail(const QString& text) {
-    lastError_ = text + QStringLiteral("\n") + Log();
+    lastError_ = text + "\n" + Log();
     Stop();
     return false;
 }
 
 QString TlsWebPeer::Address(TlsSite site, const QString& host) const {
-    return QStringLiteral("https://") + host + QLatin1Char(':') + QString::number(Port(site));
+    return "https://" + host + ':' + QString::number(Port(site));
 }
 
 QString TlsWebPeer::HostPort(TlsSite site) const {
-    return QStringLiteral("localhost:") + QString::number(Port(site));
+    return "localhost:" + QString::number(Port(site));
 }
 
 QString TlsWebPeer::Log() const {
-    return ReadText(File(QStringLiteral("nginx_error.log"))) +
-           ReadText(File(QStringLiteral("fpm.log"))) + ReadText(File(QStringLiteral("php.log")));
+    return ReadText(File("nginx_error.log")) + ReadText(File("fpm.log")) +
+           ReadText(File("php.log"));
 }
 
 QString TlsWebPeer::AccessLog() const {
-    return ReadText(File(QStringLiteral("access.log")));
+    return ReadText(File("access.log"));
 }
 
 bool TlsWebPeer::Start(const QString& dataRoot) {
-    if (!dir_.isValid()) return Fail(QStringLiteral("no temporary folder"));
+    if (!dir_.isValid()) return Fail("no temporary folder");
     if (!MakeCertificates() || !WriteConfigs(dataRoot)) return false;
     return StartFpm() && StartNginx();
 }
@@ -113,12 +112,11 @@ bool MakeTestCertificates(const QString& folder, QString& error) {
     QDir().mkpath(folder);
     QProcess make;
     make.setProcessChannelMode(QProcess::MergedChannels);
-    make.start(QStringLiteral("/usr/bin/python3"),
-               {SecurityTestDir() + QStringLiteral("/make_certs.py"), folder});
+    make.start("/usr/bin/python3", {SecurityTestDir() + "/make_certs.py", folder});
     if (make.waitForFinished(kStartMs) && make.exitStatus() == QProcess::NormalExit &&
         make.exitCode() == 0)
         return true;
-    error = QStringLiteral("make_certs.py failed: ") + QString::fromUtf8(make.readAll());
+    error = "make_certs.py failed: " + QString::fromUtf8(make.readAll());
     return false;
 }
 
@@ -128,11 +126,11 @@ bool TlsWebPeer::MakeCertificates() {
 }
 
 bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
-    const QString www = ReferenceService::ServerDir() + QStringLiteral("/www");
+    const QString www = ReferenceService::ServerDir() + "/www";
     for (TlsSite site :
          {TlsSite::Good, TlsSite::Expired, TlsSite::WrongName, TlsSite::Stranger, TlsSite::Plain})
         ports_[site] = FreePort();
-    const QString socket = File(QStringLiteral("fpm.sock"));
+    const QString socket = File("fpm.sock");
     // The locations of the deployment snippet in server/README.md.
     const QString locations =
         QStringLiteral("root %1;\n"
@@ -158,32 +156,32 @@ bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
         const int port = ports_.value(site);
         servers += QStringLiteral("server {\n  listen 127.0.0.1:%1%2;\n")
                        .arg(port)
-                       .arg(site == TlsSite::Plain ? QString() : QStringLiteral(" ssl"));
+                       .arg(site == TlsSite::Plain ? QString() : " ssl");
         if (const char* stem = StemOf(site))
             servers += QStringLiteral("  ssl_certificate %1/%2.pem;\n"
                                       "  ssl_certificate_key %1/%2.key;\n")
                            .arg(CertFolder(), QString::fromLatin1(stem));
-        servers += QStringLiteral("  include %1;\n}\n").arg(File(QStringLiteral("service.conf")));
+        servers += QStringLiteral("  include %1;\n}\n").arg(File("service.conf"));
     }
-    const QString temp = File(QStringLiteral("tmp"));
+    const QString temp = File("tmp");
     QDir().mkpath(temp);
-    const QString nginx = QStringLiteral("%1worker_processes 1;\n"
-                                         "daemon off;\n"
-                                         "pid %2/nginx.pid;\n"
-                                         "error_log %2/nginx_error.log warn;\n"
-                                         "events { worker_connections 64; }\n"
-                                         "http {\n"
-                                         "  log_format line '$server_port $request';\n"
-                                         "  access_log %2/access.log line;\n"
-                                         "  client_body_temp_path %3/body;\n"
-                                         "  fastcgi_temp_path %3/fastcgi;\n"
-                                         "  proxy_temp_path %3/proxy;\n"
-                                         "  uwsgi_temp_path %3/uwsgi;\n"
-                                         "  scgi_temp_path %3/scgi;\n"
-                                         "  keepalive_timeout 60;\n"
-                                         "%4}\n")
-                              .arg(RunAsRoot() ? QStringLiteral("user root root;\n") : QString(),
-                                   dir_.path(), temp, servers);
+    const QString nginx =
+        QStringLiteral("%1worker_processes 1;\n"
+                       "daemon off;\n"
+                       "pid %2/nginx.pid;\n"
+                       "error_log %2/nginx_error.log warn;\n"
+                       "events { worker_connections 64; }\n"
+                       "http {\n"
+                       "  log_format line '$server_port $request';\n"
+                       "  access_log %2/access.log line;\n"
+                       "  client_body_temp_path %3/body;\n"
+                       "  fastcgi_temp_path %3/fastcgi;\n"
+                       "  proxy_temp_path %3/proxy;\n"
+                       "  uwsgi_temp_path %3/uwsgi;\n"
+                       "  scgi_temp_path %3/scgi;\n"
+                       "  keepalive_timeout 60;\n"
+                       "%4}\n")
+            .arg(RunAsRoot() ? "user root root;\n" : QString(), dir_.path(), temp, servers);
     const QString fpm =
         QStringLiteral("[global]\n"
                        "pid = %1/fpm.pid\n"
@@ -197,47 +195,40 @@ bool TlsWebPeer::WriteConfigs(const QString& dataRoot) {
                        "php_admin_value[error_log] = %1/php.log\n"
                        "php_admin_flag[log_errors] = on\n"
                        "php_admin_value[output_buffering] = 0\n")
-            .arg(dir_.path(),
-                 RunAsRoot() ? QStringLiteral("user = root\ngroup = root\n") : QString(), socket);
-    if (!WriteText(File(QStringLiteral("service.conf")), locations) ||
-        !WriteText(File(QStringLiteral("nginx.conf")), nginx) ||
-        !WriteText(File(QStringLiteral("fpm.conf")), fpm))
-        return Fail(QStringLiteral("could not write the server configurations"));
+            .arg(dir_.path(), RunAsRoot() ? "user = root\ngroup = root\n" : QString(), socket);
+    if (!WriteText(File("service.conf"), locations) || !WriteText(File("nginx.conf"), nginx) ||
+        !WriteText(File("fpm.conf"), fpm))
+        return Fail("could not write the server configurations");
     return true;
 }
 
 bool TlsWebPeer::StartFpm() {
     const QString program = PhpFpmProgram();
-    if (program.isEmpty()) return Fail(QStringLiteral("php-fpm is not installed"));
-    QStringList args{QStringLiteral("-F"), QStringLiteral("-y"), File(QStringLiteral("fpm.conf"))};
-    if (RunAsRoot()) args << QStringLiteral("-R");
+    if (program.isEmpty()) return Fail("php-fpm is not installed");
+    QStringList args{"-F", "-y", File("fpm.conf")};
+    if (RunAsRoot()) args << "-R";
     fpm_.setProcessChannelMode(QProcess::MergedChannels);
-    fpm_.setStandardOutputFile(File(QStringLiteral("fpm.out")));
+    fpm_.setStandardOutputFile(File("fpm.out"));
     fpm_.start(program, args);
     const QDeadlineTimer deadline(kStartMs);
     while (!deadline.hasExpired() && fpm_.state() != QProcess::NotRunning &&
-           !QFileInfo::exists(File(QStringLiteral("fpm.sock"))))
+           !QFileInfo::exists(File("fpm.sock")))
         QThread::msleep(10);
-    if (!QFileInfo::exists(File(QStringLiteral("fpm.sock"))))
-        return Fail(QStringLiteral("php-fpm did not start: ") +
-                    ReadText(File(QStringLiteral("fpm.out"))));
+    if (!QFileInfo::exists(File("fpm.sock")))
+        return Fail("php-fpm did not start: " + ReadText(File("fpm.out")));
     return true;
 }
 
 bool TlsWebPeer::StartNginx() {
     nginx_.setProcessChannelMode(QProcess::MergedChannels);
-    nginx_.setStandardOutputFile(File(QStringLiteral("nginx.out")));
-    nginx_.start(QStringLiteral("/usr/sbin/nginx"),
-                 {QStringLiteral("-p"), dir_.path(), QStringLiteral("-c"),
-                  File(QStringLiteral("nginx.conf")), QStringLiteral("-e"),
-                  File(QStringLiteral("nginx_error.log"))});
+    nginx_.setStandardOutputFile(File("nginx.out"));
+    nginx_.start("/usr/sbin/nginx",
+                 {"-p", dir_.path(), "-c", File("nginx.conf"), "-e", File("nginx_error.log")});
     const QDeadlineTimer deadline(kStartMs);
     for (const int port : ports_) {
         while (!deadline.hasExpired() && nginx_.state() != QProcess::NotRunning && !Accepts(port))
             QThread::msleep(10);
-        if (!Accepts(port))
-            return Fail(QStringLiteral("nginx did not start: ") +
-                        ReadText(File(QStringLiteral("nginx.out"))));
+        if (!Accepts(port)) return Fail("nginx did not start: " + ReadText(File("nginx.out")));
     }
     return true;
 }

@@ -44,11 +44,11 @@ public:
     int Port(TlsSite site) const { return ports_.value(site); }
     // "https://localhost:PORT" (also for the plain site: a plain server behind
     // an https address); host may be another name for the same server.
-    QString Address(TlsSite site, const QString& host = QStringLiteral("localhost")) const;
+    QString Address(TlsSite site, const QString& host = "localhost") const;
     // "localhost:PORT", the plain site as a plain server text.
     QString HostPort(TlsSite site) const;
-    QString CaFile() const { return File(QStringLiteral("certs/ca.pem")); }
-    QString CertFolder() const { return File(QStringLiteral("certs")); }
+    QString CaFile() const { return File("certs/ca.pem"); }
+    QString CertFolder() const { return File("certs"); }
     QString LastError() const { return lastError_; }
     QString Log() const;
     // Every request nginx answered so far, "PORT REQUEST-LINE" a line.

@@ -18,8 +18,6 @@
 
 #include <gtest/gtest.h>
 
-#include <ostream>
-
 #include <csignal>
 #include <iostream>
 
@@ -67,6 +65,9 @@ protected:
         service.PlaceFile("ann", "weather.csv", "Weather\r\n12.5,3\r\n");
         ASSERT_TRUE(service.Start()) << service.LastError().toStdString();
         QDir().mkpath(Data());
+        WriteAccount();
+    }
+    void WriteAccount() {
         Settings({{"CFG_URL", service.CfgUrl("ann")},
                   {"UserID", "ann"},
                   {"Password", "p&ss word"},
@@ -143,51 +144,37 @@ TEST_F(CommandLineRunTest, EveryFileSucceedsAndTheNextRunFetchesOnlyNewRecords) 
     EXPECT_EQ(Local("site1.dat"), service.ReadFile("ann", "site1.dat"));
 }
 
-struct OutputCase {
-    const char* name;
-    QStringList arguments;
-    bool withFailure;
-    int code;
-    QStringList lines; // patterns of the standard output's lines
-};
-// The case's name in test listings.
-void PrintTo(const OutputCase& c, std::ostream* out) {
-    *out << c.name;
+TEST_F(CommandLineRunTest, LinesAndExitCodeFollowTheOutcomeAndQuiet) {
+    struct Case {
+        QStringList arguments;
+        bool withFailure;
+        int code;
+        QStringList lines; // patterns of the standard output's lines
+    };
+    const QString siteDone = R"(\[1/\d\] Site 1: downloaded 69 b)";
+    const QString missingFailed = R"(\[2/2\] Missing: failed: .*missing\.dat.*)";
+    const Case cases[] = {
+        {{"--run-all"}, false, 0, {siteDone, R"(Processed 1 file\(s\): 1 succeeded, 0 failed)"}},
+        {{"--run-all"},
+         true,
+         1,
+         {siteDone, missingFailed, R"(Processed 2 file\(s\): 1 succeeded, 1 failed)"}},
+        {{"--run-all", "--quiet"}, false, 0, {}},
+        {{"--run-all", "--quiet"}, true, 1, {missingFailed}}, // only the failure
+    };
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.arguments.join(' ').toStdString() +
+                     (c.withFailure ? " with a failure" : ""));
+        QFile::remove(Data("site1.dat")); // each case downloads it whole
+        if (c.withFailure)
+            ServeList({kSite, kMissing});
+        else
+            ServeList({kSite});
+        const auto run = cli.Run(c.arguments);
+        EXPECT_EQ(run.code, c.code) << run.err.toStdString();
+        ExpectLines(run.OutLines(), c.lines);
+    }
 }
-
-class OutputTest : public CommandLineRunTest, public ::testing::WithParamInterface<OutputCase> {};
-
-TEST_P(OutputTest, LinesAndExitCode) {
-    const OutputCase& c = GetParam();
-    if (c.withFailure)
-        ServeList({kSite, kMissing});
-    else
-        ServeList({kSite});
-    const auto run = cli.Run(c.arguments);
-    EXPECT_EQ(run.code, c.code) << run.err.toStdString();
-    ExpectLines(run.OutLines(), c.lines);
-}
-
-const QString kSiteDone = R"(\[1/\d\] Site 1: downloaded 69 b)";
-const QString kMissingFailed = R"(\[2/2\] Missing: failed: .*missing\.dat.*)";
-
-INSTANTIATE_TEST_SUITE_P(
-    Runs, OutputTest,
-    ::testing::Values(
-        OutputCase{"AllSucceed",
-                   {"--run-all"},
-                   false,
-                   0,
-                   {kSiteDone, R"(Processed 1 file\(s\): 1 succeeded, 0 failed)"}},
-        OutputCase{"OneFails",
-                   {"--run-all"},
-                   true,
-                   1,
-                   {kSiteDone, kMissingFailed, R"(Processed 2 file\(s\): 1 succeeded, 1 failed)"}},
-        OutputCase{"QuietAndAllSucceed", {"--run-all", "--quiet"}, false, 0, {}},
-        OutputCase{
-            "QuietPrintsOnlyTheFailure", {"--run-all", "--quiet"}, true, 1, {kMissingFailed}}),
-    [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(CommandLineRunTest, ADryRunTellsEachDecisionAndMovesNothing) {
     home.Write("data/notes.csv", "Field notes\r\n");
@@ -205,50 +192,36 @@ TEST_F(CommandLineRunTest, ADryRunTellsEachDecisionAndMovesNothing) {
     EXPECT_EQ(Setting("LastDownload"), "<none>");
 }
 
-struct StartCase {
-    const char* name;
-    QStringList arguments;
-    const char* setting; // changed before the run ("" for none)
-    const char* value;
-    const char* err; // what standard error says
-};
-// The case's name in test listings.
-void PrintTo(const StartCase& c, std::ostream* out) {
-    *out << c.name;
-}
-
-class CouldNotStartTest : public CommandLineRunTest,
-                          public ::testing::WithParamInterface<StartCase> {};
-
-TEST_P(CouldNotStartTest, ExitsWithTwoAndSaysWhy) {
-    const StartCase& c = GetParam();
+TEST_F(CommandLineRunTest, ARunThatCannotStartExitsWithTwoAndSaysWhy) {
+    struct Case {
+        QStringList arguments;
+        const char* setting; // changed before the run ("" for none)
+        const char* value;
+        const char* err; // what standard error says
+    };
+    const Case cases[] = {
+        {{"--run-all"}, "CFG_URL", "", "No configuration file address"},
+        {{"--run-all"},
+         "CFG_URL",
+         "http://127.0.0.1:1/none.cfg",
+         "Could not get details from: http://127.0.0.1:1/none.cfg"},
+        {{"--run-all"}, "Password", "wrong", "Login failed"},
+        {{"--run-all"}, "Password", "", "No password for user ann"}, // and no secret store
+        {{"--run-all", "--fast"}, "", "", "Exit codes of --run-all"},
+        {{"--quiet"}, "", "", "--dry-run and --quiet go with"},
+    };
     ServeList({kSite});
-    if (*c.setting) Settings({{c.setting, QString::fromUtf8(c.value)}});
-    const auto run = cli.Run(c.arguments);
-    EXPECT_EQ(run.code, 2);
-    EXPECT_TRUE(run.err.contains(QString::fromUtf8(c.err))) << run.err.toStdString();
-    EXPECT_TRUE(run.out.isEmpty()) << run.out.toStdString();
-    EXPECT_EQ(Local("site1.dat"), "<missing>");
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.err);
+        WriteAccount();
+        if (*c.setting) Settings({{c.setting, QString::fromUtf8(c.value)}});
+        const auto run = cli.Run(c.arguments);
+        EXPECT_EQ(run.code, 2);
+        EXPECT_TRUE(run.err.contains(QString::fromUtf8(c.err))) << run.err.toStdString();
+        EXPECT_TRUE(run.out.isEmpty()) << run.out.toStdString();
+        EXPECT_EQ(Local("site1.dat"), "<missing>");
+    }
 }
-
-INSTANTIATE_TEST_SUITE_P(
-    Starts, CouldNotStartTest,
-    ::testing::Values(
-        StartCase{"NoCfgAddress", {"--run-all"}, "CFG_URL", "", "No configuration file address"},
-        StartCase{"CfgNotThere",
-                  {"--run-all"},
-                  "CFG_URL",
-                  "http://127.0.0.1:1/none.cfg",
-                  "Could not get details from: http://127.0.0.1:1/none.cfg"},
-        StartCase{"WrongPassword", {"--run-all"}, "Password", "wrong", "Login failed"},
-        StartCase{"NoPasswordWithoutASecretStore",
-                  {"--run-all"},
-                  "Password",
-                  "",
-                  "No password for user ann"},
-        StartCase{"UnknownOption", {"--run-all", "--fast"}, "", "", "Exit codes of --run-all"},
-        StartCase{"QuietWithoutRunAll", {"--quiet"}, "", "", "--dry-run and --quiet go with"}),
-    [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(CommandLineRunTest, HelpDocumentsTheExitCodes) {
     const auto run = cli.Run({"--help"});

@@ -18,8 +18,6 @@
 
 #include <gtest/gtest.h>
 
-#include <ostream>
-
 #include <iostream>
 
 namespace quorvel::testing {
@@ -61,11 +59,8 @@ protected:
         f.write(bytes);
     }
     // The five lines the service wrote, joined with the given line end.
-    QByteArray CfgWith(const char* lineEnd, int lines = 5) const {
-        QList<QByteArray> parts = Cfg().split('\n');
-        for (QByteArray& p : parts)
-            p = p.trimmed();
-        parts.removeAll(QByteArray());
+    QByteArray CfgWith(const QList<QByteArray>& written, const char* lineEnd, int lines) const {
+        QList<QByteArray> parts = written;
         while (parts.size() < lines)
             parts << "extra line";
         return parts.mid(0, lines).join(lineEnd) + lineEnd;
@@ -79,44 +74,37 @@ protected:
     AccountFields fields;
 };
 
-struct CfgCase {
-    const char* name;
-    const char* lineEnd;
-    int lines;
-    bool ok;
-};
-// The case's name in test listings.
-void PrintTo(const CfgCase& c, std::ostream* out) {
-    *out << c.name;
-}
-
-class CfgLineEndTest : public LoginTest, public ::testing::WithParamInterface<CfgCase> {};
-
-TEST_P(CfgLineEndTest, TheFiveLinesFillTheFtpAndWebFields) {
-    const CfgCase& c = GetParam();
-    ServeCfg(CfgWith(c.lineEnd, c.lines));
-    EXPECT_EQ(login.GetSecureFTPDetails(fields), c.ok) << login.LastError().toStdString();
-    EXPECT_EQ(fields.gotSecure, c.ok);
-    if (!c.ok) {
-        EXPECT_TRUE(login.LastError().contains("4 of its 5 lines"))
-            << login.LastError().toStdString();
-        EXPECT_TRUE(fields.ftpServer.isEmpty());
-        return;
+TEST_F(LoginTest, TheFiveLinesOfAnyLineEndFillTheFtpAndWebFields) {
+    QList<QByteArray> written;
+    for (const QByteArray& line : Cfg().split('\n'))
+        if (!line.trimmed().isEmpty()) written << line.trimmed();
+    struct Case {
+        const char* lineEnd;
+        int lines;
+        bool ok;
+    };
+    const Case cases[] = {
+        {"\r\n", 5, true}, {"\n", 5, true}, {"\r", 5, true}, {"\r\n", 6, true}, {"\n", 4, false}};
+    const AccountFields start = fields;
+    for (const Case& c : cases) {
+        SCOPED_TRACE(QByteArray(c.lineEnd).toHex().toStdString() + " " + std::to_string(c.lines));
+        fields = start;
+        ServeCfg(CfgWith(written, c.lineEnd, c.lines));
+        EXPECT_EQ(login.GetSecureFTPDetails(fields), c.ok) << login.LastError().toStdString();
+        EXPECT_EQ(fields.gotSecure, c.ok);
+        if (!c.ok) {
+            EXPECT_TRUE(login.LastError().contains("4 of its 5 lines"))
+                << login.LastError().toStdString();
+            EXPECT_TRUE(fields.ftpServer.isEmpty());
+            continue;
+        }
+        EXPECT_EQ(fields.ftpServer, service.FtpServer());
+        EXPECT_EQ(fields.ftpUserId, "ann");
+        EXPECT_EQ(fields.ftpPassword, service.FtpPassword("ann")); // deciphered
+        EXPECT_EQ(fields.httpServer, service.HttpHostPort());
+        EXPECT_EQ(fields.webFolder, service.WebFolder());
     }
-    EXPECT_EQ(fields.ftpServer, service.FtpServer());
-    EXPECT_EQ(fields.ftpUserId, "ann");
-    EXPECT_EQ(fields.ftpPassword, service.FtpPassword("ann")); // deciphered
-    EXPECT_EQ(fields.httpServer, service.HttpHostPort());
-    EXPECT_EQ(fields.webFolder, service.WebFolder());
 }
-
-INSTANTIATE_TEST_SUITE_P(LineEnds, CfgLineEndTest,
-                         ::testing::Values(CfgCase{"CrLf", "\r\n", 5, true},
-                                           CfgCase{"Lf", "\n", 5, true},
-                                           CfgCase{"Cr", "\r", 5, true},
-                                           CfgCase{"SixLines", "\r\n", 6, true},
-                                           CfgCase{"FourLines", "\n", 4, false}),
-                         [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(LoginTest, AMissingCfgFileFailsWithTheReasonAndATickedBoxSkipsTheFetch) {
     fields.cfgUrl = service.CfgUrl("nobody");
@@ -167,38 +155,27 @@ TEST_F(LoginTest, AFailedLoginLeavesNoDetailsOfAnEarlierOne) {
     EXPECT_FALSE(fields.gotPHP);
 }
 
-struct ListCase {
-    const char* name;
-    const char* lineEnd;
-};
-// The case's name in test listings.
-void PrintTo(const ListCase& c, std::ostream* out) {
-    *out << c.name;
-}
-
-class FileListLineEndTest : public LoginTest, public ::testing::WithParamInterface<ListCase> {};
-
-TEST_P(FileListLineEndTest, TheServicesListReplacesTheOneInMemory) {
-    const char* lineEnd = GetParam().lineEnd;
-    service.PlaceFile("ann", "files.txt", kListLines[0] + lineEnd + kListLines[1] + lineEnd);
+TEST_F(LoginTest, TheServicesListOfAnyLineEndReplacesTheOneInMemory) {
     ASSERT_TRUE(login.GetSecureFTPDetails(fields));
     ASSERT_TRUE(login.GetUserDetails(fields, {}));
-    FileList list;
-    ASSERT_TRUE(login.GetFileListFromServer(fields, {}, list)) << login.LastError().toStdString();
-    EXPECT_TRUE(login.LoadErrors().empty());
-    ASSERT_EQ(list.Count(), 2);
-    EXPECT_EQ(list.At(0).Name, "Site 1");
-    EXPECT_EQ(list.At(1).FileName, "weather.csv");
-    EXPECT_TRUE(list.ListChanged);
-    EXPECT_EQ(list.LoadedFile, home.Path() + "/files.txt");
-    EXPECT_TRUE(fields.gotFileList);
-    EXPECT_TRUE(trace.traces.contains("Got file list"));
+    for (const char* lineEnd : {"\r\n", "\n", "\r"}) {
+        SCOPED_TRACE(QByteArray(lineEnd).toHex().toStdString());
+        service.PlaceFile("ann", "files.txt", kListLines[0] + lineEnd + kListLines[1] + lineEnd);
+        fields.gotFileList = false;
+        trace.traces.clear();
+        FileList list;
+        ASSERT_TRUE(login.GetFileListFromServer(fields, {}, list))
+            << login.LastError().toStdString();
+        EXPECT_TRUE(login.LoadErrors().empty());
+        ASSERT_EQ(list.Count(), 2);
+        EXPECT_EQ(list.At(0).Name, "Site 1");
+        EXPECT_EQ(list.At(1).FileName, "weather.csv");
+        EXPECT_TRUE(list.ListChanged);
+        EXPECT_EQ(list.LoadedFile, home.Path() + "/files.txt");
+        EXPECT_TRUE(fields.gotFileList);
+        EXPECT_TRUE(trace.traces.contains("Got file list"));
+    }
 }
-
-INSTANTIATE_TEST_SUITE_P(LineEnds, FileListLineEndTest,
-                         ::testing::Values(ListCase{"CrLf", "\r\n"}, ListCase{"Lf", "\n"},
-                                           ListCase{"Cr", "\r"}),
-                         [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(LoginTest, AFailedListFetchKeepsTheListAndATickedBoxFetchesNothing) {
     ASSERT_TRUE(login.GetSecureFTPDetails(fields));
