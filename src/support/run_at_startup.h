@@ -38,7 +38,7 @@ void SetRunAtStartup(int on, bool allUsers, const QStringList& arguments);
 void SetRunAtStartup(int on, bool allUsers, const QString& arguments);
 
 // The entry's text for the program at exePath started with arguments, each
-// quoted as the desktop entry specification requires.
+// quoted the way desktop entries quote their Exec arguments.
 QString AutostartEntryText(const QString& name, const QString& exePath,
                            const QStringList& arguments);
 QString AutostartEntryText(const QString& name, const QString& exePath, const QString& arguments);
