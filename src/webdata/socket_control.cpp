@@ -20,4 +20,29 @@ QString SocketStateText(std::int32_t code) {
     return QStringLiteral("WStatus:") + QString::number(code);
 }
 
+int SocketStateOf(QAbstractSocket::SocketState state, bool ready) {
+    switch (state) {
+    case QAbstractSocket::UnconnectedState:
+        return kSocketClosed;
+    case QAbstractSocket::HostLookupState:
+        return kSocketResolvingHost;
+    case QAbstractSocket::ConnectingState:
+        return kSocketConnecting;
+    case QAbstractSocket::ConnectedState:
+        return ready ? kSocketConnected : kSocketConnecting;
+    case QAbstractSocket::BoundState:
+        return kSocketOpen;
+    case QAbstractSocket::ListeningState:
+        return kSocketListening;
+    case QAbstractSocket::ClosingState:
+        return kSocketPeerClosing;
+    }
+    return kSocketClosed;
+}
+
+void LookForArrivals(QAbstractSocket& socket) {
+    for (int look = 0; look < 8 && socket.state() == QAbstractSocket::ConnectedState; ++look)
+        if (!socket.waitForReadyRead(0)) break;
+}
+
 } // namespace quorvel

@@ -6,6 +6,7 @@
 // loop, so it reaches the web-data object only while that object (or the
 // window) pumps events.
 
+#include <QAbstractSocket>
 #include <QByteArray>
 #include <QObject>
 #include <QString>
@@ -30,6 +31,15 @@ enum SocketState : int {
 
 // "Closed", "Connected", ... for 0 to 9; "WStatus:" and the code otherwise.
 QString SocketStateText(std::int32_t code);
+
+// The code of a Qt socket's state. A connected socket that may not carry a
+// request yet (ready false: a TLS one before its certificate is verified)
+// still counts as connecting.
+int SocketStateOf(QAbstractSocket::SocketState state, bool ready = true);
+
+// Each look reads what has come, the close included; a few looks take in
+// bytes that came just before a close.
+void LookForArrivals(QAbstractSocket& socket);
 
 class SocketControl : public QObject {
     Q_OBJECT

@@ -60,24 +60,7 @@ QString SslSocketControl::Peer() const {
 int SslSocketControl::State() const {
     if (failed_) return kSocketError;
     if (peerClosed_) return kSocketPeerClosing;
-    switch (socket_.state()) {
-    case QAbstractSocket::UnconnectedState:
-        return kSocketClosed;
-    case QAbstractSocket::HostLookupState:
-        return kSocketResolvingHost;
-    case QAbstractSocket::ConnectingState:
-        return kSocketConnecting;
-    case QAbstractSocket::ConnectedState:
-        // Until the certificate is verified the connection is still being made.
-        return socket_.isEncrypted() ? kSocketConnected : kSocketConnecting;
-    case QAbstractSocket::BoundState:
-        return kSocketOpen;
-    case QAbstractSocket::ListeningState:
-        return kSocketListening;
-    case QAbstractSocket::ClosingState:
-        return kSocketPeerClosing;
-    }
-    return kSocketClosed;
+    return SocketStateOf(socket_.state(), socket_.isEncrypted());
 }
 
 void SslSocketControl::Close() {
@@ -128,10 +111,8 @@ QByteArray SslSocketControl::GetData() {
 }
 
 void SslSocketControl::Refresh() {
-    // As for plain TCP: each look decrypts what has come, the close included;
-    // what was decrypted is announced now, not on the next pass of the loop.
-    for (int look = 0; look < 8 && socket_.state() == QAbstractSocket::ConnectedState; ++look)
-        if (!socket_.waitForReadyRead(0)) break;
+    // What was decrypted is announced now, not on the next pass of the loop.
+    LookForArrivals(socket_);
     AnnounceArrival();
 }
 

@@ -28,23 +28,7 @@ TcpSocketControl::~TcpSocketControl() {
 int TcpSocketControl::State() const {
     if (failed_) return kSocketError;
     if (peerClosed_) return kSocketPeerClosing;
-    switch (socket_.state()) {
-    case QAbstractSocket::UnconnectedState:
-        return kSocketClosed;
-    case QAbstractSocket::HostLookupState:
-        return kSocketResolvingHost;
-    case QAbstractSocket::ConnectingState:
-        return kSocketConnecting;
-    case QAbstractSocket::ConnectedState:
-        return kSocketConnected;
-    case QAbstractSocket::BoundState:
-        return kSocketOpen;
-    case QAbstractSocket::ListeningState:
-        return kSocketListening;
-    case QAbstractSocket::ClosingState:
-        return kSocketPeerClosing;
-    }
-    return kSocketClosed;
+    return SocketStateOf(socket_.state());
 }
 
 void TcpSocketControl::Close() {
@@ -72,10 +56,7 @@ QByteArray TcpSocketControl::GetData() {
 }
 
 void TcpSocketControl::Refresh() {
-    // Each look reads what has come, the close included; a few looks take in
-    // bytes that came just before a close.
-    for (int look = 0; look < 8 && socket_.state() == QAbstractSocket::ConnectedState; ++look)
-        if (!socket_.waitForReadyRead(0)) break;
+    LookForArrivals(socket_);
 }
 
 void TcpSocketControl::OnConnected() {
