@@ -64,8 +64,9 @@ void frm_WebDataClient::Form_Load() {
     SetBackground(c_.Lbl_UserName, kStatusHighlight);
     SetBackground(c_.Lst_Files, kStatusHighlight);
 
-    AppSettings values = AppSettings::Defaults(ProgramHome::Folder(), QDate::currentDate().year(),
-                                               ProgramHome::DefaultDataFolder());
+    AppSettings values =
+        AppSettings::Defaults(ProgramHome::Folder(), CurrentClock().Now().date().year(),
+                              ProgramHome::DefaultDataFolder());
     const auto error = values.Load(settings_);
     recent_ = values.recentFiles;
     ApplySettings(values);

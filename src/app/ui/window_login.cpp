@@ -9,14 +9,6 @@
 
 namespace quorvel {
 
-namespace {
-
-void SetTicked(QCheckBox* box, bool ticked) {
-    box->setChecked(ticked);
-}
-
-} // namespace
-
 void frm_WebDataClient::ConnectLoginHandlers() {
     connect(c_.Cmd_Login, &QPushButton::clicked, this, [this] { Cmd_Login_Click(); });
     connect(c_.Cmd_GetCFG, &QPushButton::clicked, this, [this] { Cmd_GetCFG_Click(); });
@@ -55,9 +47,9 @@ void frm_WebDataClient::ShowAccountFields(const AccountFields& f) {
     set(c_.Txt_ftpPassword, f.ftpPassword);
     set(c_.Txt_httpServer, f.httpServer);
     set(c_.Txt_WebFolder, f.webFolder);
-    SetTicked(c_.Chk_GotSecure, f.gotSecure);
-    SetTicked(c_.Chk_GotPHP, f.gotPHP);
-    SetTicked(c_.Chk_GotFileList, f.gotFileList);
+    c_.Chk_GotSecure->setChecked(f.gotSecure);
+    c_.Chk_GotPHP->setChecked(f.gotPHP);
+    c_.Chk_GotFileList->setChecked(f.gotFileList);
     c_.Lbl_UserName->setText(f.userName);
     c_.Lbl_UserFolder->setText(f.userFolderOnSite);
     set(c_.Txt_UserFolder, f.userFolder);

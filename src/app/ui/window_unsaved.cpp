@@ -84,10 +84,9 @@ bool frm_WebDataClient::SaveListNow(bool mayAsk) {
 }
 
 bool frm_WebDataClient::RescueList() {
-    const QString path =
-        ProgramHome::Folder() + QDir::separator() +
-        QStringLiteral("files-unsaved-%1.txt")
-            .arg(QDateTime::currentDateTime().toString(QStringLiteral("yyyyMMdd-HHmmss")));
+    const QString path = ProgramHome::Folder() + QDir::separator() +
+                         QStringLiteral("files-unsaved-%1.txt")
+                             .arg(CurrentClock().Now().toString(QStringLiteral("yyyyMMdd-HHmmss")));
     if (const auto error = files_.WriteTo(path)) {
         WriteLogFile(QStringLiteral("The file list could not be saved: ") + error->description);
         return true; // nothing more an unattended window can do
